@@ -1,0 +1,12 @@
+// Starting other programs and documents through the shell, without waiting for them.
+#ifndef AUTOPLAY_ACTIONS_SHELL_START_WIN_H
+#define AUTOPLAY_ACTIONS_SHELL_START_WIN_H
+
+#include <windows.h>
+
+// ShellExecuteW with the verb "open" and SW_SHOWNORMAL; returns its result as a number
+// (above 32 on success).
+INT_PTR OpenWithShell(HWND owner, const wchar_t* file, const wchar_t* parameters,
+                      const wchar_t* directory);
+
+#endif

@@ -1,0 +1,3 @@
+#include "shell/launcher_state.h"
+
+LauncherState launcher;

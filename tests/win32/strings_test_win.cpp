@@ -1,0 +1,147 @@
+// The eighteen string sets as compiled into the program's resources.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <string>
+
+#include "locale/language_table.h"
+#include "locale/strings_win.h"
+#include "shell/launcher_state.h"
+#include "test_support_win.h"
+
+namespace {
+
+constexpr std::uint32_t kOffsets[] = {1,  2,  3,  7,  8,  10, 12, 13, 14, 15, 17, 18, 19,
+                                      20, 21, 22, 23, 24, 25, 27, 28, 29, 30, 31, 32, 69,
+                                      70, 71, 72, 73, 77, 78, 79, 80, 84, 85, 98, 99};
+constexpr std::uint32_t kCaptionOffsets[] = {15, 18, 20, 22, 23, 28, 30, 84, 99};
+constexpr std::uint32_t kTwoSentenceOffsets[] = {21, 24, 25, 27, 98};
+
+std::wstring Load(LanguageBase base, std::uint32_t offset, std::size_t capacity = 1024) {
+    std::wstring text(capacity, L'\0');
+    int length = LoadLocalString(base, offset, text.data(), capacity);
+    text.resize(static_cast<std::size_t>(length));
+    return text;
+}
+
+std::size_t Count(const std::wstring& text, const std::wstring& part) {
+    std::size_t count = 0;
+    for (std::size_t at = text.find(part); at != std::wstring::npos; at = text.find(part, at + 1)) {
+        ++count;
+    }
+    return count;
+}
+
+class StringSets : public testing::Test {
+protected:
+    void SetUp() override { ResetLauncherConfiguration(); }
+};
+
+TEST_F(StringSets, EveryLanguageHasEveryOffsetAndFitsItsBuffer) {
+    for (const LanguageInfo& language : Languages()) {
+        for (std::uint32_t offset : kOffsets) {
+            SCOPED_TRACE(testing::Message() << "string " << language.base + offset);
+            std::wstring text = Load(language.base, offset);
+            EXPECT_FALSE(text.empty());
+            EXPECT_LT(text.size(), kMessageCapacity);
+            EXPECT_EQ(text.find(L"  ", 0) != std::wstring::npos,
+                      std::find(std::begin(kTwoSentenceOffsets), std::end(kTwoSentenceOffsets),
+                                offset) != std::end(kTwoSentenceOffsets));
+        }
+        for (std::uint32_t offset : kCaptionOffsets) {
+            SCOPED_TRACE(testing::Message() << "caption " << language.base + offset);
+            EXPECT_LT(Load(language.base, offset).size(), kCaptionCapacity);
+        }
+    }
+}
+
+TEST_F(StringSets, FormatsKeepExactlyOnePlaceholder) {
+    for (const LanguageInfo& language : Languages()) {
+        for (std::uint32_t offset : kOffsets) {
+            SCOPED_TRACE(testing::Message() << "string " << language.base + offset);
+            std::wstring text = Load(language.base, offset);
+            bool isFormat = offset == 24 || offset == 25;
+            EXPECT_EQ(Count(text, L"%s"), isFormat ? 1u : 0u);
+            EXPECT_EQ(Count(text, L"%"), isFormat ? 1u : 0u);
+        }
+    }
+}
+
+TEST_F(StringSets, OwnNamesAreWrittenInTheirOwnLanguage) {
+    const std::pair<LanguageBase, const wchar_t*> names[] = {
+        {kUsEnglish, L"English"},
+        {kFrench, L"Fran\u00e7ais"},
+        {kGerman, L"Deutsch"},
+        {kSwedish, L"Svenska"},
+        {kDutch, L"Nederlands"},
+        {kPortuguese, L"Portugu\u00eas(BR)"},
+        {kSpanish, L"Espa\u00f1ol"},
+        {kItalian, L"Italiano"},
+        {kPolish, L"Polski"},
+        {kJapanese, L"\u65e5\u672c\u8a9e"},
+        {kTraditionalChinese, L"\u7e41\u9ad4\u4e2d\u6587"},
+        {kSimplifiedChinese, L"\u7b80\u4f53\u4e2d\u6587\u7248"},
+        {kThai, L"\u0e44\u0e17\u0e22"},
+        {kKorean, L"\ud55c\uad6d\uc5b4"},
+        {kUkEnglish, L"English"},
+        {kNorwegian, L"Norsk"},
+        {kFinnish, L"Suomeksi"},
+        {kDanish, L"Dansk"},
+    };
+    for (const auto& [base, name] : names) {
+        SCOPED_TRACE(base);
+        EXPECT_EQ(Load(base, kStrLanguageName), name);
+    }
+}
+
+TEST_F(StringSets, UkEnglishDiffersFromUsEnglishOnlyInTheHelpLabelAndSite) {
+    for (std::uint32_t offset : kOffsets) {
+        SCOPED_TRACE(offset);
+        if (offset == kStrSupportTool || offset == kStrVisitWebSite) continue;
+        EXPECT_EQ(Load(kUkEnglish, offset), Load(kUsEnglish, offset));
+    }
+    EXPECT_EQ(Load(kUkEnglish, kStrSupportTool), L"Ix Help");
+    EXPECT_EQ(Load(kUsEnglish, kStrSupportTool), L"Trivex");
+}
+
+TEST_F(StringSets, UsEnglishTextsAreTheProductsOwn) {
+    EXPECT_EQ(Load(kUsEnglish, kStrNotOnDiscText),
+              L"Autoplay will only run from The Vemo installation CD.  Exiting now.");
+    EXPECT_EQ(Load(kUsEnglish, kStrInsertDiscCaption), L"Insert Disc 1");
+    EXPECT_EQ(Load(kUsEnglish, kStrInsertDiscText),
+              L"To continue with this operation, please insert Disc 1 into the CD-ROM drive and "
+              L"click OK.");
+    EXPECT_EQ(Load(kUsEnglish, kStrDemoMissingFormat),
+              L"Sorry.  The demo %s can't be found on this CD.");
+    EXPECT_EQ(Load(kUsEnglish, kStrVisitWebSite), std::wstring(L"Visit ") + WebSiteFor(kUsEnglish));
+}
+
+TEST_F(StringSets, WebSiteLabelNamesTheLanguagesOwnSite) {
+    for (const LanguageInfo& language : Languages()) {
+        SCOPED_TRACE(language.base);
+        std::wstring site = WebSiteFor(language.base);
+        // Korea's site is a full address; its label names the host.
+        std::size_t hostStart = site.find(L"//");
+        hostStart = hostStart == std::wstring::npos ? 0 : hostStart + 2;
+        std::wstring host = site.substr(hostStart, site.find(L'/', hostStart) - hostStart);
+        EXPECT_NE(Load(language.base, kStrVisitWebSite).find(host), std::wstring::npos);
+    }
+}
+
+TEST_F(StringSets, NoLanguageOrAnUnknownOneGivesEmptyTexts) {
+    for (LanguageBase base : {kNoLanguage, LanguageBase{9000}, LanguageBase{20000}}) {
+        SCOPED_TRACE(base);
+        EXPECT_EQ(Load(base, kStrInstall), L"");
+        EXPECT_EQ(Load(base, kStrNotOnDiscText), L"");
+    }
+}
+
+TEST_F(StringSets, TextsAreCutToTheirBufferAndTerminated) {
+    wchar_t caption[8];
+    std::fill(std::begin(caption), std::end(caption), L'#');
+    int length = LoadLocalString(kUsEnglish, kStrInsertDiscText, caption, 8);
+    EXPECT_EQ(length, 7);
+    EXPECT_EQ(std::wstring(caption), L"To cont");
+}
+
+}  // namespace

@@ -1,0 +1,125 @@
+#include "test_support_win.h"
+
+#include <gtest/gtest.h>
+
+#include "platform/text_win.h"
+#include "shell/launcher_state.h"
+
+void DeleteMachineKey(const wchar_t* path) {
+    LONG result = RegDeleteTreeW(HKEY_LOCAL_MACHINE, path);
+    if (result == ERROR_SUCCESS) RegDeleteKeyW(HKEY_LOCAL_MACHINE, path);
+}
+
+ScopedMachineKey::ScopedMachineKey(const wchar_t* path) : path_(path) {
+    LONG result = RegCreateKeyExW(HKEY_LOCAL_MACHINE, path, 0, nullptr, 0, KEY_ALL_ACCESS, nullptr,
+                                  &key_, nullptr);
+    EXPECT_EQ(result, ERROR_SUCCESS);
+}
+
+ScopedMachineKey::~ScopedMachineKey() {
+    if (key_) RegCloseKey(key_);
+    DeleteMachineKey(path_.c_str());
+}
+
+void ScopedMachineKey::SetText(const wchar_t* name, const std::wstring& text) {
+    DWORD bytes = static_cast<DWORD>((text.size() + 1) * sizeof(wchar_t));
+    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.c_str()),
+                             bytes),
+              ERROR_SUCCESS);
+}
+
+void ScopedMachineKey::SetUnterminatedText(const wchar_t* name, const std::wstring& text) {
+    // Wine quietly adds the terminator when the character after the data is NUL, so the
+    // data is followed by something else here.
+    std::wstring guarded = text + L"#";
+    DWORD bytes = static_cast<DWORD>(text.size() * sizeof(wchar_t));
+    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(guarded.data()),
+                             bytes),
+              ERROR_SUCCESS);
+}
+
+void ScopedMachineKey::SetDword(const wchar_t* name, DWORD value) {
+    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_DWORD, reinterpret_cast<const BYTE*>(&value),
+                             sizeof(value)),
+              ERROR_SUCCESS);
+}
+
+void ScopedMachineKey::SetBinary(const wchar_t* name, const void* data, DWORD size) {
+    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_BINARY, static_cast<const BYTE*>(data), size),
+              ERROR_SUCCESS);
+}
+
+TempFolder::TempFolder() {
+    wchar_t base[MAX_PATH];
+    GetTempPathW(MAX_PATH, base);
+    static unsigned counter = 0;
+    for (;;) {
+        path_ = std::wstring(base) + L"autoplay-test-" + std::to_wstring(GetCurrentProcessId()) +
+                L"-" + std::to_wstring(++counter) + L"\\";
+        if (CreateDirectoryW(path_.c_str(), nullptr)) break;
+        if (GetLastError() != ERROR_ALREADY_EXISTS) {
+            ADD_FAILURE() << "cannot create a temporary folder";
+            break;
+        }
+    }
+}
+
+TempFolder::~TempFolder() { RemoveTree(path_); }
+
+std::wstring TempFolder::WriteFile(const std::wstring& relativePath, const std::string& bytes) const {
+    std::wstring path = path_ + relativePath;
+    for (std::size_t slash = path.find(L'\\', path_.size()); slash != std::wstring::npos;
+         slash = path.find(L'\\', slash + 1)) {
+        CreateDirectoryW(path.substr(0, slash).c_str(), nullptr);
+    }
+    HANDLE file = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
+                              FILE_ATTRIBUTE_NORMAL, nullptr);
+    EXPECT_NE(file, INVALID_HANDLE_VALUE);
+    if (file != INVALID_HANDLE_VALUE) {
+        DWORD written = 0;
+        ::WriteFile(file, bytes.data(), static_cast<DWORD>(bytes.size()), &written, nullptr);
+        CloseHandle(file);
+    }
+    return path;
+}
+
+void RemoveTree(const std::wstring& folder) {
+    std::wstring root = folder;
+    if (!root.empty() && root.back() != L'\\') root += L'\\';
+    WIN32_FIND_DATAW entry;
+    HANDLE search = FindFirstFileW((root + L"*").c_str(), &entry);
+    if (search != INVALID_HANDLE_VALUE) {
+        do {
+            std::wstring name = entry.cFileName;
+            if (name == L"." || name == L"..") continue;
+            std::wstring path = root + name;
+            if (entry.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) {
+                RemoveTree(path);
+            } else {
+                SetFileAttributesW(path.c_str(), FILE_ATTRIBUTE_NORMAL);
+                DeleteFileW(path.c_str());
+            }
+        } while (FindNextFileW(search, &entry));
+        FindClose(search);
+    }
+    RemoveDirectoryW(root.c_str());
+}
+
+void ResetLauncherConfiguration() {
+    launcher.discSku = 0;
+    launcher.productSku = 0;
+    launcher.languageBase = kNoLanguage;
+    launcher.languageKnown = false;
+    launcher.useSystemLanguage = false;
+    launcher.instance = GetModuleHandleW(nullptr);
+}
+
+bool RunningOnWine() {
+    HMODULE ntdll = GetModuleHandleW(L"ntdll.dll");
+    return ntdll && GetProcAddress(ntdll, "wine_get_version") != nullptr;
+}
+
+std::wstring TestProgramFolder() {
+    std::wstring path = ModuleFileName();
+    return path.substr(0, path.rfind(L'\\') + 1);
+}

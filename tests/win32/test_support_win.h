@@ -1,0 +1,63 @@
+// Helpers shared by the Windows tests: registry keys and folders that clean up after
+// themselves, and a way back to a fresh launcher state between tests.
+#ifndef AUTOPLAY_TESTS_TEST_SUPPORT_WIN_H
+#define AUTOPLAY_TESTS_TEST_SUPPORT_WIN_H
+
+#include <windows.h>
+
+#include <string>
+
+// Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine.
+void DeleteMachineKey(const wchar_t* path);
+
+// An HKEY_LOCAL_MACHINE key created for one test and deleted with everything below it when
+// the test ends.
+class ScopedMachineKey {
+public:
+    explicit ScopedMachineKey(const wchar_t* path);
+    ~ScopedMachineKey();
+    ScopedMachineKey(const ScopedMachineKey&) = delete;
+    ScopedMachineKey& operator=(const ScopedMachineKey&) = delete;
+
+    void SetText(const wchar_t* name, const std::wstring& text);
+    // Stores the characters without a terminating NUL in the data.
+    void SetUnterminatedText(const wchar_t* name, const std::wstring& text);
+    void SetDword(const wchar_t* name, DWORD value);
+    void SetBinary(const wchar_t* name, const void* data, DWORD size);
+    HKEY Get() const { return key_; }
+
+private:
+    std::wstring path_;
+    HKEY key_ = nullptr;
+};
+
+// A new empty folder under %TEMP%, removed with its contents when the test ends.
+class TempFolder {
+public:
+    TempFolder();
+    ~TempFolder();
+    TempFolder(const TempFolder&) = delete;
+    TempFolder& operator=(const TempFolder&) = delete;
+
+    // With a trailing backslash.
+    const std::wstring& Path() const { return path_; }
+    // Writes a file below the folder (making sub-folders as needed) and returns its path.
+    std::wstring WriteFile(const std::wstring& relativePath, const std::string& bytes) const;
+
+private:
+    std::wstring path_;
+};
+
+// Deletes a folder and everything in it.
+void RemoveTree(const std::wstring& folder);
+
+// Puts the launcher's configuration fields back to their start values.
+void ResetLauncherConfiguration();
+
+// Wine behaves differently from Windows in a few documented details.
+bool RunningOnWine();
+
+// The folder of the running test program, with a trailing backslash.
+std::wstring TestProgramFolder();
+
+#endif
