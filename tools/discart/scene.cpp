@@ -572,12 +572,13 @@ Canvas PaintMainScene(const FontLibrary& fonts) {
     bank.haze = 0.35f;
     bank.seed = 23;
     PaintCloudBank(canvas, light, bank);
-    bank.x0 = -40.0f;
-    bank.x1 = 178.0f;
-    bank.base = 272.0f;
-    bank.minRadius = 12.0f;
-    bank.maxRadius = 30.0f;
-    bank.haze = 0.3f;
+    // The Install caption is written across this bank, so its top stays above the caption.
+    bank.x0 = -50.0f;
+    bank.x1 = 225.0f;
+    bank.base = 254.0f;
+    bank.minRadius = 26.0f;
+    bank.maxRadius = 36.0f;
+    bank.haze = 0.25f;
     bank.seed = 41;
     PaintCloudBank(canvas, light, bank);
 
