@@ -174,9 +174,10 @@ Mask Dilate(const Mask& mask, float radius) {
             for (int dy = -r; dy <= r && best < 1.0f; ++dy) {
                 for (int dx = -r; dx <= r; ++dx) {
                     const float v = mask.Sample(x + dx, y + dy);
-                    if (v <= best) continue;
+                    if (v <= 0.0f) continue;
+                    // A partly covered pixel has its edge that much nearer to its centre.
                     const float distance = std::sqrt(static_cast<float>(dx * dx + dy * dy));
-                    best = std::max(best, v * Clamp01(radius + 0.5f - distance));
+                    best = std::max(best, Clamp01(v + radius - distance));
                 }
             }
             out.At(x, y) = best;

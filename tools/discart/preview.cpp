@@ -182,7 +182,20 @@ Place FacePlace(int key) {
     }
 }
 
-// Every circular face in its four states, each over the background at its own place.
+// The average colour of the background under a face: plain cells keep the sheet small.
+Rgb MeanColor(const Picture& background, Place place, const IconResource& icon) {
+    double sum[3] = {0.0, 0.0, 0.0};
+    for (int y = 0; y < icon.height; ++y) {
+        for (int x = 0; x < icon.width; ++x) {
+            for (int k = 0; k < 3; ++k) sum[k] += background.Pixel(place.x + x, place.y + y)[k];
+        }
+    }
+    const double n = 255.0 * icon.width * icon.height;
+    return {static_cast<float>(sum[0] / n), static_cast<float>(sum[1] / n),
+            static_cast<float>(sum[2] / n)};
+}
+
+// Every circular face in its four states, each on the colour of the background at its place.
 Picture ButtonSheet(Art& art, const FontLibrary& fonts) {
     const int labelWidth = 40;
     const int gap = 12;
@@ -203,7 +216,7 @@ Picture ButtonSheet(Art& art, const FontLibrary& fonts) {
         const Place place = FacePlace(icon.key);
         for (int state = 0; state < 4; ++state) {
             if (icon.pictureIds[state] == 0) continue;
-            Picture cell = Cut(background, place.x, place.y, icon.width, icon.height);
+            Picture cell = Filled(icon.width, icon.height, MeanColor(background, place, icon));
             DrawFace(art, cell, icon.key, state, 0, 0);
             Paste(sheet, cell, labelWidth + gap + state * (162 + gap) + (162 - icon.width) / 2, y);
         }
