@@ -26,7 +26,9 @@ uint32_t U32(const Bytes& b, size_t at) {
 uint16_t U16(const Bytes& b, size_t at) {
     return static_cast<uint16_t>(b[at] | b[at + 1] << 8);
 }
-int32_t I32(const Bytes& b, size_t at) { return static_cast<int32_t>(U32(b, at)); }
+int32_t I32(const Bytes& b, size_t at) {
+    return static_cast<int32_t>(U32(b, at));
+}
 
 bool ReadAll(const std::string& path, Bytes& bytes) {
     std::ifstream in(path, std::ios::binary);
@@ -167,14 +169,14 @@ struct PlateSpec {
 };
 
 const PlateSpec kPlates[] = {
-    {0, 408, 409, 416, 29, 222},   {1, 350, 352, 416, 81, 222},   {2, 340, 338, 416, 133, 222},
-    {3, 336, 353, 416, 185, 222},  {4, 358, 361, 416, 28, 227},   {5, 348, 346, 416, 81, 227},
-    {6, 354, 357, 416, 133, 227},  {7, 344, 355, 416, 185, 227},  {8, 316, 314, 295, 71, 376},
-    {9, 406, 404, 295, 19, 376},   {10, 312, 317, 295, 123, 376}, {11, 286, 287, 84, 151, 0},
-    {12, 290, 291, 84, 202, 0},    {13, 294, 295, 84, 253, 0},    {14, 298, 299, 84, 304, 0},
-    {15, 302, 303, 300, 151, 0},   {16, 306, 307, 300, 202, 0},   {17, 502, 503, 300, 253, 0},
-    {18, 506, 507, 300, 304, 0},   {19, 510, 511, 300, 355, 0},   {20, 512, 513, 84, 355, 0},
-    {21, 514, 515, 84, 100, 0},    {22, 516, 517, 300, 100, 0},
+    {0, 408, 409, 416, 29, 222},  {1, 350, 352, 416, 81, 222},   {2, 340, 338, 416, 133, 222},
+    {3, 336, 353, 416, 185, 222}, {4, 358, 361, 416, 28, 227},   {5, 348, 346, 416, 81, 227},
+    {6, 354, 357, 416, 133, 227}, {7, 344, 355, 416, 185, 227},  {8, 316, 314, 295, 71, 376},
+    {9, 406, 404, 295, 19, 376},  {10, 312, 317, 295, 123, 376}, {11, 286, 287, 84, 151, 0},
+    {12, 290, 291, 84, 202, 0},   {13, 294, 295, 84, 253, 0},    {14, 298, 299, 84, 304, 0},
+    {15, 302, 303, 300, 151, 0},  {16, 306, 307, 300, 202, 0},   {17, 502, 503, 300, 253, 0},
+    {18, 506, 507, 300, 304, 0},  {19, 510, 511, 300, 355, 0},   {20, 512, 513, 84, 355, 0},
+    {21, 514, 515, 84, 100, 0},   {22, 516, 517, 300, 100, 0},
 };
 
 struct PanelSpec {
@@ -213,7 +215,7 @@ std::vector<Rect> LayoutRects() {
 
 std::vector<BitmapSpec> AllBitmaps() {
     std::vector<BitmapSpec> all = {
-        {377, 640, 480, 24}, {248, 350, 350, 8}, {376, 240, 149, 24}, {227, 237, 256, 24},
+        {377, 640, 480, 24}, {248, 350, 350, 8},  {376, 240, 149, 24}, {227, 237, 256, 24},
         {222, 237, 252, 24}, {241, 400, 488, 24}, {264, 162, 117, 8},
     };
     for (const PlateSpec& plate : kPlates) {
@@ -236,7 +238,7 @@ std::vector<BitmapSpec> AllBitmaps() {
 }
 
 class DiscArt : public ::testing::Test {
-protected:
+  protected:
     void SetUp() override {
         const char* dir = std::getenv("DISC_ART_DIR");
         if (!dir || !*dir) {
@@ -314,7 +316,8 @@ TEST_F(DiscArt, ResourceScriptListsEveryResourceOnceWithoutLanguage) {
         EXPECT_TRUE(ReadAll(Path(file), listed)) << "listed file is missing: " << file;
     }
     std::set<std::string> expected = {"247 IDR_PALETTE", "113 WAVE", "308 WAVE", "101 ICON"};
-    for (const BitmapSpec& spec : AllBitmaps()) expected.insert(std::to_string(spec.id) + " BITMAP");
+    for (const BitmapSpec& spec : AllBitmaps())
+        expected.insert(std::to_string(spec.id) + " BITMAP");
     for (const std::string& key : expected) EXPECT_EQ(entries.count(key), 1u) << key;
     EXPECT_EQ(entries.size(), expected.size());
 }
@@ -367,7 +370,8 @@ TEST_F(DiscArt, SoundsAreShortCleanMonoPcm) {
         const char* file;
         double minSeconds, maxSeconds;
     };
-    for (const WaveSpec& spec : {WaveSpec{"wave_113.wav", 0.02, 0.15}, WaveSpec{"wave_308.wav", 4.0, 7.0}}) {
+    for (const WaveSpec& spec :
+         {WaveSpec{"wave_113.wav", 0.02, 0.15}, WaveSpec{"wave_308.wav", 4.0, 7.0}}) {
         SCOPED_TRACE(spec.file);
         Bytes wav;
         ASSERT_TRUE(ReadAll(Path(spec.file), wav));
@@ -542,7 +546,8 @@ TEST_F(DiscArt, AboutHoverFaceFitsTheSharedMask) {
         for (int x = 0; x < mask.width; ++x) {
             const int m = mask.Grey(x, y);
             if (m == 0 || m == 255) continue;
-            for (int k = 0; k < 3; ++k) difference += std::abs(normal.At(x, y)[k] - hover.At(x, y)[k]);
+            for (int k = 0; k < 3; ++k)
+                difference += std::abs(normal.At(x, y)[k] - hover.At(x, y)[k]);
             count += 3;
         }
     }
@@ -571,7 +576,8 @@ TEST_F(DiscArt, PlatesMatchWhatLiesUnderTheirPlace) {
     for (const PanelSpec& panel : kPanels) grounds[panel.id] = WithPanel(panel.id);
     for (const PlateSpec& plate : kPlates) {
         for (int id : {plate.normal, plate.pressed}) {
-            SCOPED_TRACE("plate key " + std::to_string(plate.key) + " bitmap " + std::to_string(id));
+            SCOPED_TRACE("plate key " + std::to_string(plate.key) + " bitmap " +
+                         std::to_string(id));
             const Bitmap& picture = Picture(id);
             const Bitmap& ground = grounds[plate.panel];
             ASSERT_GT(picture.width, 0);
@@ -618,8 +624,9 @@ TEST_F(DiscArt, PanelEdgesBlendIntoTheBackground) {
         for (int y : {0, picture.height - 1}) {
             for (int x : {0, 1, picture.width - 2, picture.width - 1}) {
                 for (int k = 0; k < 3; ++k) {
-                    worst = std::max(worst, std::abs(picture.At(x, y)[k] -
-                                                     english.At(panel.place.x + x, panel.place.y + y)[k]));
+                    worst = std::max(worst,
+                                     std::abs(picture.At(x, y)[k] -
+                                              english.At(panel.place.x + x, panel.place.y + y)[k]));
                 }
             }
         }
@@ -649,9 +656,9 @@ TEST_F(DiscArt, BackgroundsShareEveryRectangleOfTheLayout) {
             }
             EXPECT_EQ(differing, 0) << "rectangle at " << r.x << "," << r.y;
         }
-        const bool english_ = std::string(name) == "AutoPlayBack.bmp" ||
-                              std::string(name) == "AutoPlayBackUk.bmp";
-        if (!english_) {
+        const bool isEnglish =
+            std::string(name) == "AutoPlayBack.bmp" || std::string(name) == "AutoPlayBackUk.bmp";
+        if (!isEnglish) {
             EXPECT_NE(b.pixels, english.pixels) << "no greeting of its own";
         }
     }

@@ -70,8 +70,11 @@ TEST(DiscartCompositing, MaskedBlendFollowsTheLauncherArithmetic) {
     struct Case {
         int m, a, b, expected;
     };
-    const Case cases[] = {{0, 200, 100, 100}, {255, 200, 100, 200}, {128, 200, 100, 149},
-                          {252, 255, 255, 254}, {251, 0, 255, 3}};
+    const Case cases[] = {{0, 200, 100, 100},
+                          {255, 200, 100, 200},
+                          {128, 200, 100, 149},
+                          {252, 255, 255, 254},
+                          {251, 0, 255, 3}};
     for (const Case& c : cases) {
         SCOPED_TRACE("mask " + std::to_string(c.m));
         Picture a(1, 1, 24), b(1, 1, 24), mask(1, 1, 8);
@@ -94,7 +97,10 @@ TEST(DiscartCompositing, CutPicturesConvertBackByteForByte) {
 TEST(DiscartDrawing, AntialiasedShapesCoverTheirArea) {
     Canvas canvas(64, 64);
     FillSdf(
-        canvas, [](float x, float y) { return SdCircle({x, y}, {32.0f, 32.0f}, 20.0f); },
+        canvas,
+        [](float x, float y) {
+            return SdCircle({x, y}, {32.0f, 32.0f}, 20.0f);
+        },
         Hex(0xFFFFFF), canvas.Bounds());
     float area = 0.0f;
     for (const Rgba& p : canvas.pixels) area += p.a;
@@ -146,7 +152,7 @@ TEST(DiscartPalette, KeepsFixedEntriesAndFindsThePicturesColours) {
 }
 
 class DiscartFonts : public ::testing::Test {
-protected:
+  protected:
     void SetUp() override {
         std::string error;
         ASSERT_TRUE(fonts.Load(error)) << error;
@@ -157,7 +163,8 @@ protected:
 TEST_F(DiscartFonts, ThaiToneMarkSitsLowWithoutAnUpperVowel) {
     // "to" with the second tone mark, and the same with an upper vowel between them.
     const TextMask bare = fonts.Render(Face::Thai, "\xE0\xB8\x95\xE0\xB9\x89", 40.0f);
-    const TextMask stacked = fonts.Render(Face::Thai, "\xE0\xB8\x95\xE0\xB8\xB4\xE0\xB9\x89", 40.0f);
+    const TextMask stacked =
+        fonts.Render(Face::Thai, "\xE0\xB8\x95\xE0\xB8\xB4\xE0\xB9\x89", 40.0f);
     const int bareTop = bare.baseline - bare.ink.y0;
     const int stackedTop = stacked.baseline - stacked.ink.y0;
     EXPECT_LT(bareTop + 4, stackedTop) << "the tone mark kept its high, stacking form";

@@ -51,10 +51,10 @@ Canvas PaintAboutPicture(const FontLibrary& fonts) {
     PaintMedallion(canvas, {200.0f, 88.0f}, 70.0f);
     PaintBanner(canvas, fonts, {200.0f, 150.0f}, 92.0f, 16.0f, 25.0f);
 
-    const TextMask title = fonts.Render(Face::ComicBold, "The Vemo Vodizuri Virezazida",
-                                        fonts.FitSize({{Face::ComicBold, "The Vemo Vodizuri Virezazida"}},
-                                                      27.0f, 360.0f, 0.4f),
-                                        0.4f, 16);
+    const TextMask title = fonts.Render(
+        Face::ComicBold, "The Vemo Vodizuri Virezazida",
+        fonts.FitSize({{Face::ComicBold, "The Vemo Vodizuri Virezazida"}}, 27.0f, 360.0f, 0.4f),
+        0.4f, 16);
     DrawText(canvas, title, CentredPenX(title, 200.0f), 208.0f,
              Outlined(Hex(0xFFF6A8), Hex(0xF8A030), 2.6f));
     const TextMask product = fonts.Render(Face::ComicBold, "AutoPlay", 23.0f, 0.8f, 16);
@@ -86,8 +86,8 @@ Canvas PaintAboutPicture(const FontLibrary& fonts) {
     for (const Credit& credit : kCredits) {
         const TextMask roleText = fonts.Render(Face::ComicBold, credit.role, 13.0f, 0.2f, 8);
         const TextMask nameText = fonts.Render(Face::ComicBold, credit.names, 13.5f, 0.2f, 8);
-        DrawText(canvas, roleText,
-                 186.0f - static_cast<float>(roleText.ink.x1 - roleText.originX), baseline, role);
+        DrawText(canvas, roleText, 186.0f - static_cast<float>(roleText.ink.x1 - roleText.originX),
+                 baseline, role);
         DrawText(canvas, nameText, 198.0f, baseline, name);
         baseline += 20.0f;
     }

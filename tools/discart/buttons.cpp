@@ -10,8 +10,8 @@ namespace {
 constexpr Rgb kShadow = Hex(0x0A1030);
 
 Box Around(Vec2 centre, float radius) {
-    return Grow({static_cast<int>(centre.x), static_cast<int>(centre.y),
-                 static_cast<int>(centre.x), static_cast<int>(centre.y)},
+    return Grow({static_cast<int>(centre.x), static_cast<int>(centre.y), static_cast<int>(centre.x),
+                 static_cast<int>(centre.y)},
                 static_cast<int>(std::ceil(radius)) + 2);
 }
 
@@ -105,11 +105,10 @@ Canvas PaintOrb(const OrbDesign& design, FaceState state) {
     const bool latched = state == FaceState::Latched;
     const Vec2 c = design.centre + (pressed ? Vec2{1.0f, 2.0f} : Vec2{});
     const float r = design.radius;
-    const float room =
-        std::min(std::min(design.centre.x, design.centre.y),
-                 std::min(static_cast<float>(design.width) - design.centre.x,
-                          static_cast<float>(design.height) - design.centre.y)) -
-        r;
+    const float room = std::min(std::min(design.centre.x, design.centre.y),
+                                std::min(static_cast<float>(design.width) - design.centre.x,
+                                         static_cast<float>(design.height) - design.centre.y)) -
+                       r;
     const Box all = layer.Bounds();
 
     if (!focused) {
@@ -132,14 +131,20 @@ Canvas PaintOrb(const OrbDesign& design, FaceState state) {
             return Tint{Hex(0x7EEBFF), 0.75f * std::pow(1.0f - t, 2.0f)};
         });
         FillSdf(
-            layer, [&](float x, float y) { return SdRing({x, y}, c, r + 1.8f, 1.7f); },
+            layer,
+            [&](float x, float y) {
+                return SdRing({x, y}, c, r + 1.8f, 1.7f);
+            },
             Hex(0xE6FDFF), all);
     }
 
     // Gold rim, lit from the upper left like everything in the scene.
     const float brightness = pressed ? 0.78f : focused ? 1.1f : 1.0f;
     FillSdf(
-        layer, [&](float x, float y) { return SdCircle({x, y}, c, r); },
+        layer,
+        [&](float x, float y) {
+            return SdCircle({x, y}, c, r);
+        },
         [&](float x, float y) {
             const Vec2 n = (Vec2{x, y} - c) * (1.0f / r);
             const float light = Clamp01(Dot(n, Vec2{-0.6f, -0.8f}) * 0.5f + 0.5f);
@@ -153,7 +158,10 @@ Canvas PaintOrb(const OrbDesign& design, FaceState state) {
     const Vec2 hot = c + Vec2{-0.3f, -0.38f} * body;
     const Rgb accent = design.accent;
     FillSdf(
-        layer, [&](float x, float y) { return SdCircle({x, y}, c, body); },
+        layer,
+        [&](float x, float y) {
+            return SdCircle({x, y}, c, body);
+        },
         [&](float x, float y) {
             const float d = Clamp01(Length(Vec2{x, y} - hot) / (1.45f * body));
             Rgb color = Mix(Lighten(accent, 0.4f), accent * 0.42f, std::pow(d, 1.1f));
@@ -165,13 +173,16 @@ Canvas PaintOrb(const OrbDesign& design, FaceState state) {
     FillSdf(
         layer,
         [&](float x, float y) {
-            return std::max(SdEllipse({x, y}, c + Vec2{0.0f, 0.55f} * body,
-                                      {0.7f * body, 0.42f * body}),
-                            SdCircle({x, y}, c, body));
+            return std::max(
+                SdEllipse({x, y}, c + Vec2{0.0f, 0.55f} * body, {0.7f * body, 0.42f * body}),
+                SdCircle({x, y}, c, body));
         },
         Lighten(accent, 0.6f), all, pressed ? 0.25f : 0.45f, Blend::Screen, body * 0.35f);
     FillSdf(
-        layer, [&](float x, float y) { return SdRing({x, y}, c, body - 1.0f, 1.4f); },
+        layer,
+        [&](float x, float y) {
+            return SdRing({x, y}, c, body - 1.0f, 1.4f);
+        },
         [&](float x, float y) {
             const Vec2 n = (Vec2{x, y} - c) * (1.0f / body);
             return Tint{kShadow, 0.45f * Clamp01(0.2f - n.y)};
@@ -216,8 +227,11 @@ Canvas PaintOrb(const OrbDesign& design, FaceState state) {
     const std::vector<Vec2> star =
         StarPoints(glint, focused ? body * 0.2f : body * 0.13f, body * 0.03f, 4, 0.0f);
     FillSdf(
-        layer, [&](float x, float y) { return SdPolygon({x, y}, star); }, Hex(0xFFFFFF), all,
-        pressed ? 0.4f : 0.9f);
+        layer,
+        [&](float x, float y) {
+            return SdPolygon({x, y}, star);
+        },
+        Hex(0xFFFFFF), all, pressed ? 0.4f : 0.9f);
 
     FadeEdges(layer, 2.0f);
     return layer;

@@ -7,7 +7,9 @@ namespace discart {
 
 namespace {
 
-float Clamp01(float v) { return std::min(1.0f, std::max(0.0f, v)); }
+float Clamp01(float v) {
+    return std::min(1.0f, std::max(0.0f, v));
+}
 
 Box Clip(Box box, int width, int height) {
     return {std::max(0, box.x0), std::max(0, box.y0), std::min(width, box.x1),
@@ -38,7 +40,9 @@ void BoxPass(std::vector<float>& values, int width, int height, int radius, bool
 
 }  // namespace
 
-float Luma(Rgb c) { return 0.2126f * c.r + 0.7152f * c.g + 0.0722f * c.b; }
+float Luma(Rgb c) {
+    return 0.2126f * c.r + 0.7152f * c.g + 0.0722f * c.b;
+}
 
 Box Grow(Box box, int margin) {
     return {box.x0 - margin, box.y0 - margin, box.x1 + margin, box.y1 + margin};

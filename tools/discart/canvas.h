@@ -12,16 +12,29 @@ struct Rgb {
     float b = 0.0f;
 };
 
-inline Rgb operator+(Rgb a, Rgb b) { return {a.r + b.r, a.g + b.g, a.b + b.b}; }
-inline Rgb operator-(Rgb a, Rgb b) { return {a.r - b.r, a.g - b.g, a.b - b.b}; }
-inline Rgb operator*(Rgb a, float s) { return {a.r * s, a.g * s, a.b * s}; }
-inline Rgb operator*(Rgb a, Rgb b) { return {a.r * b.r, a.g * b.g, a.b * b.b}; }
-inline Rgb Mix(Rgb a, Rgb b, float t) { return a + (b - a) * t; }
-inline Rgb Lighten(Rgb c, float amount) { return Mix(c, Rgb{1.0f, 1.0f, 1.0f}, amount); }
+inline Rgb operator+(Rgb a, Rgb b) {
+    return {a.r + b.r, a.g + b.g, a.b + b.b};
+}
+inline Rgb operator-(Rgb a, Rgb b) {
+    return {a.r - b.r, a.g - b.g, a.b - b.b};
+}
+inline Rgb operator*(Rgb a, float s) {
+    return {a.r * s, a.g * s, a.b * s};
+}
+inline Rgb operator*(Rgb a, Rgb b) {
+    return {a.r * b.r, a.g * b.g, a.b * b.b};
+}
+inline Rgb Mix(Rgb a, Rgb b, float t) {
+    return a + (b - a) * t;
+}
+inline Rgb Lighten(Rgb c, float amount) {
+    return Mix(c, Rgb{1.0f, 1.0f, 1.0f}, amount);
+}
 
 constexpr Rgb Hex(uint32_t rgb) {
     return {static_cast<float>((rgb >> 16) & 0xFF) / 255.0f,
-            static_cast<float>((rgb >> 8) & 0xFF) / 255.0f, static_cast<float>(rgb & 0xFF) / 255.0f};
+            static_cast<float>((rgb >> 8) & 0xFF) / 255.0f,
+            static_cast<float>(rgb & 0xFF) / 255.0f};
 }
 
 float Luma(Rgb c);

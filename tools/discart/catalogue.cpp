@@ -1,6 +1,5 @@
 #include "catalogue.h"
 
-#include <cmath>
 #include <map>
 #include <sstream>
 
@@ -36,18 +35,29 @@ const PanelResource kPanels[] = {
 OrbDesign DesignFor(int key) {
     const Rgb play = Hex(0x17A37E);
     switch (key) {
-        case 0: return {85, 96, {40.0f, 50.0f}, 35.0f, Hex(0x2C6FD8), InstallSymbol};
-        case 1: return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbol};
-        case 2: return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::German};
-        case 3: return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::Japanese};
-        case 4: return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::French};
-        case 5: return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::Spanish};
+        case 0:
+            return {85, 96, {40.0f, 50.0f}, 35.0f, Hex(0x2C6FD8), InstallSymbol};
+        case 1:
+            return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbol};
+        case 2:
+            return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::German};
+        case 3:
+            return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::Japanese};
+        case 4:
+            return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::French};
+        case 5:
+            return {85, 96, {40.0f, 50.0f}, 35.0f, play, PlaySymbolRaised, Sash::Spanish};
         // The web button's hit circle runs past its picture's left edge; the orb stays inside.
-        case 6: return {66, 67, {31.0f, 32.0f}, 27.0f, Hex(0x1F8FD0), GlobeSymbol};
-        case 7: return {73, 79, {33.0f, 42.0f}, 29.0f, Hex(0x7A4FC8), GamepadSymbol};
-        case 8: return {73, 79, {33.0f, 42.0f}, 29.0f, Hex(0xE08A1E), StarSymbol};
-        case 9: return {73, 87, {37.0f, 48.0f}, 27.0f, Hex(0x138C9A), BookSymbol};
-        default: return {54, 54, {26.0f, 25.0f}, 22.0f, Hex(0xD0405A), PowerSymbol};
+        case 6:
+            return {66, 67, {31.0f, 32.0f}, 27.0f, Hex(0x1F8FD0), GlobeSymbol};
+        case 7:
+            return {73, 79, {33.0f, 42.0f}, 29.0f, Hex(0x7A4FC8), GamepadSymbol};
+        case 8:
+            return {73, 79, {33.0f, 42.0f}, 29.0f, Hex(0xE08A1E), StarSymbol};
+        case 9:
+            return {73, 87, {37.0f, 48.0f}, 27.0f, Hex(0x138C9A), BookSymbol};
+        default:
+            return {54, 54, {26.0f, 25.0f}, 22.0f, Hex(0xD0405A), PowerSymbol};
     }
 }
 
@@ -149,8 +159,8 @@ bool GenerateResources(const std::string& directory, std::string& error) {
     }
     for (const PlateResource& plate : PlateResources()) {
         const bool fromList = plate.ground == PlateGround::LanguageList;
-        const Picture under = Cut(grounds[plate.ground], plate.x, plate.y, fromList ? 212 : 209,
-                                  fromList ? 50 : 49);
+        const Picture under =
+            Cut(grounds[plate.ground], plate.x, plate.y, fromList ? 212 : 209, fromList ? 50 : 49);
         bitmaps[plate.normalId] = PaintPlate(under, false);
         bitmaps[plate.pressedId] = PaintPlate(under, true);
     }
@@ -167,7 +177,8 @@ bool GenerateResources(const std::string& directory, std::string& error) {
             if (!bitmaps.count(icon.maskIds[state])) {
                 bitmaps[icon.maskIds[state]] = ToGrey(AlphaOf(face));
             }
-            CollectOpaque(bitmaps[icon.pictureIds[state]], bitmaps[icon.maskIds[state]], faceColors);
+            CollectOpaque(bitmaps[icon.pictureIds[state]], bitmaps[icon.maskIds[state]],
+                          faceColors);
         }
     }
     bitmaps[kAboutMaskId] = ToGrey(AboutSilhouette(fonts));

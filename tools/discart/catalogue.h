@@ -10,7 +10,7 @@ enum class PlateGround { GamesPanel, InformationPanel, PlayPanel, LanguageList }
 
 struct PlateResource {
     int key;
-    int normalId;   // also the focused face
+    int normalId;  // also the focused face
     int pressedId;
     PlateGround ground;
     int x;

@@ -25,7 +25,10 @@ void PaintMedallion(Canvas& canvas, Vec2 c, float r, float glow, float brightnes
     // Small icons drop the fine details and thicken the strokes.
     const float small = finalRadius < 12.0f ? 1.0f : 0.0f;
     FillSdf(
-        canvas, [&](float x, float y) { return SdCircle({x, y}, c, r); },
+        canvas,
+        [&](float x, float y) {
+            return SdCircle({x, y}, c, r);
+        },
         [&](float x, float y) {
             const Vec2 n = (Vec2{x, y} - c) * (1.0f / r);
             const float light = Clamp01(Dot(n, Vec2{-0.6f, -0.8f}) * 0.5f + 0.5f);
@@ -41,13 +44,19 @@ void PaintMedallion(Canvas& canvas, Vec2 c, float r, float glow, float brightnes
             const float angle = 2.0f * kPi * static_cast<float>(i) / 28.0f;
             const Vec2 bead = c + Vec2{std::cos(angle), std::sin(angle)} * (r - rim * 0.5f);
             FillSdf(
-                canvas, [&](float x, float y) { return SdCircle({x, y}, bead, rim * 0.22f); },
+                canvas,
+                [&](float x, float y) {
+                    return SdCircle({x, y}, bead, rim * 0.22f);
+                },
                 Hex(0xFFF6D2) * brightness, box, 0.7f);
         }
     }
     const Vec2 hot = c + Vec2{-0.25f, -0.4f} * body;
     FillSdf(
-        canvas, [&](float x, float y) { return SdCircle({x, y}, c, body); },
+        canvas,
+        [&](float x, float y) {
+            return SdCircle({x, y}, c, body);
+        },
         [&](float x, float y) {
             const float d = Clamp01(Length(Vec2{x, y} - hot) / (1.5f * body));
             Rgb color = Mix(Hex(0x4A86E8), Hex(0x0C1A5C), std::pow(d, 0.9f));
@@ -60,7 +69,10 @@ void PaintMedallion(Canvas& canvas, Vec2 c, float r, float glow, float brightnes
         box);
     if (glow > 0.0f) {
         FillSdf(
-            canvas, [&](float x, float y) { return SdCircle({x, y}, c, body); },
+            canvas,
+            [&](float x, float y) {
+                return SdCircle({x, y}, c, body);
+            },
             [&](float x, float y) {
                 const float t = Clamp01(Length(Vec2{x, y} - c) / body);
                 return Tint{Hex(0xFFF2C0), glow * Smoothstep(0.6f, 1.0f, t) * 0.8f};
@@ -72,9 +84,10 @@ void PaintMedallion(Canvas& canvas, Vec2 c, float r, float glow, float brightnes
     const float stroke = (0.13f + 0.05f * small) * s;
     auto monogram = [&](float x, float y) {
         const Vec2 p = {x, y};
-        const float left = SdSegment(p, c + Vec2{-0.42f, -0.42f} * s, c + Vec2{0.0f, 0.42f} * s, stroke);
-        const float right = SdSegment(p, c + Vec2{0.42f, -0.42f} * s, c + Vec2{0.0f, 0.42f} * s,
-                                      stroke * 0.75f);
+        const float left =
+            SdSegment(p, c + Vec2{-0.42f, -0.42f} * s, c + Vec2{0.0f, 0.42f} * s, stroke);
+        const float right =
+            SdSegment(p, c + Vec2{0.42f, -0.42f} * s, c + Vec2{0.0f, 0.42f} * s, stroke * 0.75f);
         float v = std::min(left, right);
         if (small == 0.0f) {
             v = std::min(v, SdSegment(p, c + Vec2{-0.6f, -0.44f} * s, c + Vec2{-0.26f, -0.44f} * s,
@@ -86,12 +99,16 @@ void PaintMedallion(Canvas& canvas, Vec2 c, float r, float glow, float brightnes
     };
     if (small == 0.0f) {
         FillSdf(
-            canvas, [&](float x, float y) { return monogram(x + s * 0.05f, y - s * 0.07f) - s * 0.04f; },
+            canvas,
+            [&](float x, float y) { return monogram(x + s * 0.05f, y - s * 0.07f) - s * 0.04f; },
             kNavy, box, 0.5f * brightness);
     }
     FillSdf(
-        canvas, [&](float x, float y) { return monogram(x, y) - std::max(0.6f * supersampling, s * 0.05f); }, kNavy,
-        box);
+        canvas,
+        [&](float x, float y) {
+            return monogram(x, y) - std::max(0.6f * supersampling, s * 0.05f);
+        },
+        kNavy, box);
     FillSdf(
         canvas, [&](float x, float y) { return monogram(x, y); },
         [&](float, float y) {
@@ -100,10 +117,14 @@ void PaintMedallion(Canvas& canvas, Vec2 c, float r, float glow, float brightnes
         },
         box);
     const Vec2 star = c + Vec2{0.4f, -0.36f} * s;
-    const std::vector<Vec2> points = StarPoints(star, s * (0.3f + 0.08f * glow), s * 0.06f, 4, 0.0f);
+    const std::vector<Vec2> points =
+        StarPoints(star, s * (0.3f + 0.08f * glow), s * 0.06f, 4, 0.0f);
     FillSdf(
-        canvas, [&](float x, float y) { return SdPolygon({x, y}, points); }, Hex(0xFFFFFF), box,
-        brightness);
+        canvas,
+        [&](float x, float y) {
+            return SdPolygon({x, y}, points);
+        },
+        Hex(0xFFFFFF), box, brightness);
     const Vec2 shine = c + Vec2{0.0f, -0.52f} * body;
     FillSdf(
         canvas,
@@ -113,7 +134,8 @@ void PaintMedallion(Canvas& canvas, Vec2 c, float r, float glow, float brightnes
         },
         [&](float, float y) {
             const float t = Clamp01((y - (shine.y - 0.38f * body)) / (0.76f * body));
-            return Tint{Hex(0xFFFFFF), (0.4f + 0.15f * glow) * std::pow(1.0f - t, 1.6f) * brightness};
+            return Tint{Hex(0xFFFFFF),
+                        (0.4f + 0.15f * glow) * std::pow(1.0f - t, 1.6f) * brightness};
         },
         box, 1.0f, Blend::Over, 1.5f);
 }
@@ -135,20 +157,27 @@ void PaintBanner(Canvas& canvas, const FontLibrary& fonts, Vec2 c, float halfWid
         const float outer = c.x + side * halfWidth * 1.2f;
         const float y0 = c.y + curve(inner) - halfHeight * 0.55f;
         const float y1 = c.y + curve(inner) + halfHeight * 1.45f;
-        const std::vector<Vec2> tail = {{inner, y0},
-                                        {outer, y0 + halfHeight * 0.1f},
-                                        {outer - side * halfHeight * 0.7f, (y0 + y1) * 0.5f + halfHeight * 0.05f},
-                                        {outer, y1 + halfHeight * 0.1f},
-                                        {inner, y1}};
+        const std::vector<Vec2> tail = {
+            {inner, y0},
+            {outer, y0 + halfHeight * 0.1f},
+            {outer - side * halfHeight * 0.7f, (y0 + y1) * 0.5f + halfHeight * 0.05f},
+            {outer, y1 + halfHeight * 0.1f},
+            {inner, y1}};
         FillSdf(
-            canvas, [&](float x, float y) { return SdPolygon({x, y}, tail) - 0.6f; },
+            canvas,
+            [&](float x, float y) {
+                return SdPolygon({x, y}, tail) - 0.6f;
+            },
             [&](float, float y) {
                 return Tint{Mix(Hex(0xD8962E), Hex(0x9A5E16), Clamp01((y - y0) / (y1 - y0))) *
                             brightness};
             },
             box);
         FillSdf(
-            canvas, [&](float x, float y) { return std::fabs(SdPolygon({x, y}, tail) - 0.6f) - 0.7f; },
+            canvas,
+            [&](float x, float y) {
+                return std::fabs(SdPolygon({x, y}, tail) - 0.6f) - 0.7f;
+            },
             kNavy, box, 0.8f);
     }
     auto band = [&](float x, float y) {
@@ -190,7 +219,10 @@ namespace {
 Mask Silhouette(const FontLibrary& fonts, Vec2 shift) {
     Canvas shape(162, 117);
     FillSdf(
-        shape, [&](float x, float y) { return SdCircle({x, y}, kAboutCentre + shift, kAboutRadius); },
+        shape,
+        [&](float x, float y) {
+            return SdCircle({x, y}, kAboutCentre + shift, kAboutRadius);
+        },
         Hex(0x000000), shape.Bounds());
     PaintBanner(shape, fonts, kBannerCentre + shift, 58.0f, 11.0f, 17.0f);
     return AlphaOf(shape);
@@ -198,7 +230,9 @@ Mask Silhouette(const FontLibrary& fonts, Vec2 shift) {
 
 }  // namespace
 
-Mask AboutSilhouette(const FontLibrary& fonts) { return Silhouette(fonts, {}); }
+Mask AboutSilhouette(const FontLibrary& fonts) {
+    return Silhouette(fonts, {});
+}
 
 Canvas PaintAboutButton(const FontLibrary& fonts, FaceState state) {
     Canvas layer(162, 117);
@@ -221,8 +255,11 @@ Canvas PaintAboutButton(const FontLibrary& fonts, FaceState state) {
         for (const Vec2& at : sparkles) {
             const std::vector<Vec2> star = StarPoints(at, 5.0f, 1.0f, 4, 0.0f);
             FillSdf(
-                layer, [&](float x, float y) { return SdPolygon({x, y}, star); }, Hex(0xFFFFFF),
-                layer.Bounds(), 0.9f);
+                layer,
+                [&](float x, float y) {
+                    return SdPolygon({x, y}, star);
+                },
+                Hex(0xFFFFFF), layer.Bounds(), 0.9f);
         }
     }
     FadeEdges(layer, 2.0f);

@@ -12,7 +12,7 @@ namespace discart {
 namespace {
 
 class ByteWriter {
-public:
+  public:
     void U8(uint32_t v) { bytes.push_back(static_cast<uint8_t>(v)); }
     void U16(uint32_t v) {
         U8(v & 0xFF);
@@ -37,7 +37,9 @@ uint8_t ToByte(float v, float offset) {
     return static_cast<uint8_t>(std::clamp(std::lround(v * 255.0f + offset), 0L, 255L));
 }
 
-int RowStride(int width, int bits) { return ((width * bits + 31) / 32) * 4; }
+int RowStride(int width, int bits) {
+    return ((width * bits + 31) / 32) * 4;
+}
 
 void WriteInfoHeader(ByteWriter& w, int width, int height, int bits, uint32_t imageSize) {
     w.U32(40);
@@ -253,8 +255,7 @@ std::vector<uint8_t> EncodeIcon(const std::vector<IconImage>& images) {
         const int n = image.size;
         const int maskStride = RowStride(n, 1);
         // The height counts the colour rows and the transparency rows together.
-        WriteInfoHeader(w, n, n * 2, 32,
-                        static_cast<uint32_t>(n * n * 4 + maskStride * n));
+        WriteInfoHeader(w, n, n * 2, 32, static_cast<uint32_t>(n * n * 4 + maskStride * n));
         for (int y = n - 1; y >= 0; --y) {
             for (int x = 0; x < n; ++x) {
                 const uint8_t* p = &image.rgba[(static_cast<size_t>(y) * n + x) * 4];
@@ -279,7 +280,8 @@ std::vector<uint8_t> EncodeIcon(const std::vector<IconImage>& images) {
 
 bool WriteFile(const std::string& path, const std::vector<uint8_t>& bytes) {
     std::ofstream out(path, std::ios::binary | std::ios::trunc);
-    out.write(reinterpret_cast<const char*>(bytes.data()), static_cast<std::streamsize>(bytes.size()));
+    out.write(reinterpret_cast<const char*>(bytes.data()),
+              static_cast<std::streamsize>(bytes.size()));
     return static_cast<bool>(out);
 }
 

@@ -19,7 +19,9 @@ struct Picture {
 
     Picture() = default;
     Picture(int w, int h, int bits)
-        : width(w), height(h), bitsPerPixel(bits),
+        : width(w),
+          height(h),
+          bitsPerPixel(bits),
           bytes(static_cast<size_t>(w) * h * (bits / 8), 0) {}
     uint8_t* Pixel(int x, int y) {
         return &bytes[(static_cast<size_t>(y) * width + x) * (bitsPerPixel / 8)];

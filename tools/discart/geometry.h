@@ -13,15 +13,31 @@ struct Vec2 {
     float y = 0.0f;
 };
 
-inline Vec2 operator+(Vec2 a, Vec2 b) { return {a.x + b.x, a.y + b.y}; }
-inline Vec2 operator-(Vec2 a, Vec2 b) { return {a.x - b.x, a.y - b.y}; }
-inline Vec2 operator*(Vec2 a, float s) { return {a.x * s, a.y * s}; }
-inline float Dot(Vec2 a, Vec2 b) { return a.x * b.x + a.y * b.y; }
-inline float Length(Vec2 a) { return std::sqrt(Dot(a, a)); }
+inline Vec2 operator+(Vec2 a, Vec2 b) {
+    return {a.x + b.x, a.y + b.y};
+}
+inline Vec2 operator-(Vec2 a, Vec2 b) {
+    return {a.x - b.x, a.y - b.y};
+}
+inline Vec2 operator*(Vec2 a, float s) {
+    return {a.x * s, a.y * s};
+}
+inline float Dot(Vec2 a, Vec2 b) {
+    return a.x * b.x + a.y * b.y;
+}
+inline float Length(Vec2 a) {
+    return std::sqrt(Dot(a, a));
+}
 
-inline float Clamp(float v, float lo, float hi) { return std::min(hi, std::max(lo, v)); }
-inline float Clamp01(float v) { return Clamp(v, 0.0f, 1.0f); }
-inline float Lerp(float a, float b, float t) { return a + (b - a) * t; }
+inline float Clamp(float v, float lo, float hi) {
+    return std::min(hi, std::max(lo, v));
+}
+inline float Clamp01(float v) {
+    return Clamp(v, 0.0f, 1.0f);
+}
+inline float Lerp(float a, float b, float t) {
+    return a + (b - a) * t;
+}
 
 inline float Smoothstep(float edge0, float edge1, float x) {
     const float t = Clamp01((x - edge0) / (edge1 - edge0));
@@ -34,7 +50,9 @@ inline float SmoothMin(float a, float b, float k) {
     return Lerp(b, a, h) - k * h * (1.0f - h);
 }
 
-inline float SdCircle(Vec2 p, Vec2 centre, float radius) { return Length(p - centre) - radius; }
+inline float SdCircle(Vec2 p, Vec2 centre, float radius) {
+    return Length(p - centre) - radius;
+}
 
 // Box given by its centre and half extents, corners rounded by radius.
 inline float SdRoundBox(Vec2 p, Vec2 centre, Vec2 half, float radius) {

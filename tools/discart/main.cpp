@@ -7,9 +7,10 @@
 namespace {
 
 int Usage() {
-    std::fprintf(stderr,
-                 "usage: discart resources <outdir>   pictures, palette, sounds, icon, pictures.rc\n"
-                 "       discart backgrounds <outdir> the eighteen language backgrounds\n");
+    std::fprintf(
+        stderr,
+        "usage: discart resources <outdir>   pictures, palette, sounds, icon, pictures.rc\n"
+        "       discart backgrounds <outdir> the eighteen language backgrounds\n");
     return 2;
 }
 

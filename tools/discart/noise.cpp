@@ -11,7 +11,9 @@ uint64_t Random::Next() {
     return z ^ (z >> 31);
 }
 
-float Random::Unit() { return static_cast<float>(Next() >> 40) / static_cast<float>(1ull << 24); }
+float Random::Unit() {
+    return static_cast<float>(Next() >> 40) / static_cast<float>(1ull << 24);
+}
 
 float Hash2(int x, int y, uint32_t seed) {
     uint32_t h = static_cast<uint32_t>(x) * 0x8DA6B343u ^ static_cast<uint32_t>(y) * 0xD8163841u ^

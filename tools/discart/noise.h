@@ -7,14 +7,14 @@ namespace discart {
 // Small seeded generator: the same seed gives the same pictures on every machine, which the
 // standard library's distributions do not promise.
 class Random {
-public:
+  public:
     explicit Random(uint64_t seed) : state(seed) {}
     uint64_t Next();
     // Uniform in [0, 1).
     float Unit();
     float Range(float lo, float hi) { return lo + (hi - lo) * Unit(); }
 
-private:
+  private:
     uint64_t state;
 };
 

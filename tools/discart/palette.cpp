@@ -6,7 +6,9 @@ namespace discart {
 
 namespace {
 
-int Channel(const Rgb8& c, int channel) { return channel == 0 ? c.r : channel == 1 ? c.g : c.b; }
+int Channel(const Rgb8& c, int channel) {
+    return channel == 0 ? c.r : channel == 1 ? c.g : c.b;
+}
 
 struct ColorBox {
     explicit ColorBox(std::vector<Rgb8> all) : colors(std::move(all)) {
@@ -51,9 +53,8 @@ std::vector<Rgb8> MedianCut(std::vector<Rgb8> samples, size_t count) {
         for (size_t i = 0; i < boxes.size(); ++i) {
             if (boxes[i].colors.size() < 2) continue;
             for (int channel = 0; channel < 3; ++channel) {
-                const long score =
-                    static_cast<long>(boxes[i].Range(channel)) * 1000 +
-                    static_cast<long>(std::min<size_t>(boxes[i].colors.size(), 999));
+                const long score = static_cast<long>(boxes[i].Range(channel)) * 1000 +
+                                   static_cast<long>(std::min<size_t>(boxes[i].colors.size(), 999));
                 if (boxes[i].Range(channel) > 0 && score > bestScore) {
                     bestScore = score;
                     best = i;

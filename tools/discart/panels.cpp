@@ -29,7 +29,9 @@ void PaintSoftShadow(Canvas& canvas, Box frame, float radius, Vec2 offset, float
     PaintMask(canvas, shadow, 0, 0, kShadow, alpha);
 }
 
-Rgb Gold(float t) { return Mix(Hex(0xFFEDB0), Hex(0xB67A26), Clamp01(t)); }
+Rgb Gold(float t) {
+    return Mix(Hex(0xFFEDB0), Hex(0xB67A26), Clamp01(t));
+}
 
 }  // namespace
 
@@ -75,8 +77,11 @@ void PaintGlassFrame(Canvas& canvas, Box frame, float radius, float opacity) {
     for (const Vec2& corner : corners) {
         const std::vector<Vec2> star = StarPoints(corner, 4.5f, 1.0f, 4, 0.0f);
         FillSdf(
-            canvas, [&](float x, float y) { return SdPolygon({x, y}, star); }, Hex(0xFFE9A8), all,
-            0.9f);
+            canvas,
+            [&](float x, float y) {
+                return SdPolygon({x, y}, star);
+            },
+            Hex(0xFFE9A8), all, 0.9f);
     }
 }
 
@@ -91,7 +96,11 @@ Picture PaintPanel(const Picture& under, PanelMotif motif) {
                          random.Range(14.0f, static_cast<float>(canvas.height) - 16.0f)};
         const float size = random.Range(0.5f, 1.0f);
         FillSdf(
-            canvas, [&](float x, float y) { return SdCircle({x, y}, at, size); }, Hex(0xCFE8FF),
+            canvas,
+            [&](float x, float y) {
+                return SdCircle({x, y}, at, size);
+            },
+            Hex(0xCFE8FF),
             Grow({static_cast<int>(at.x), static_cast<int>(at.y), static_cast<int>(at.x),
                   static_cast<int>(at.y)},
                  3),
@@ -156,7 +165,8 @@ Picture PaintPlate(const Picture& under, bool pressed) {
                 return std::max(body(x, y) + 2.5f, (top + height * 0.72f) - y);
             },
             [&](float, float y) {
-                return Tint{Hex(0x6FD8F4), 0.22f * Clamp01((y - top - height * 0.72f) / (height * 0.28f))};
+                return Tint{Hex(0x6FD8F4),
+                            0.22f * Clamp01((y - top - height * 0.72f) / (height * 0.28f))};
             },
             all, 1.0f, Blend::Over, 2.0f);
     } else {
@@ -173,13 +183,16 @@ Picture PaintPlate(const Picture& under, bool pressed) {
         [&](float, float y) { return Tint{Gold((y - top) / height) * (pressed ? 0.8f : 1.0f)}; },
         all);
     FillSdf(
-        canvas, [&](float x, float y) { return std::fabs(body(x, y) + 3.0f) - 0.5f; }, Hex(0x0A1034),
-        all, 0.5f);
+        canvas, [&](float x, float y) { return std::fabs(body(x, y) + 3.0f) - 0.5f; },
+        Hex(0x0A1034), all, 0.5f);
     // Gold rivets at both ends, out of the way of even the longest label.
     for (float side : {-1.0f, 1.0f}) {
         const Vec2 rivet = {centre.x + side * (half.x - 6.5f), centre.y};
         FillSdf(
-            canvas, [&](float x, float y) { return SdCircle({x, y}, rivet, 1.9f); },
+            canvas,
+            [&](float x, float y) {
+                return SdCircle({x, y}, rivet, 1.9f);
+            },
             [&](float x, float y) {
                 const float d = Clamp01(Length(Vec2{x, y} - (rivet + Vec2{-0.6f, -0.7f})) / 2.5f);
                 return Tint{Mix(Hex(0xFFF6D0), Hex(0xB07A26), d) * (pressed ? 0.75f : 1.0f)};

@@ -16,7 +16,7 @@ using namespace discart;
 constexpr Rgb kCaption = Hex(0x00008C);
 
 class Art {
-public:
+  public:
     explicit Art(std::string dir) : directory(std::move(dir)) {}
 
     const Picture& Get(const std::string& name) {
@@ -36,12 +36,14 @@ public:
 
     bool failed = false;
 
-private:
+  private:
     std::string directory;
     std::map<std::string, Picture> cache;
 };
 
-const IconResource& Icon(int key) { return IconResources()[static_cast<size_t>(key)]; }
+const IconResource& Icon(int key) {
+    return IconResources()[static_cast<size_t>(key)];
+}
 
 void DrawFace(Art& art, Picture& target, int key, int state, int x, int y) {
     const IconResource& icon = Icon(key);
@@ -64,14 +66,14 @@ void DrawLabel(Picture& target, const FontLibrary& fonts, Face face, const std::
 void DrawCaption(Picture& target, const FontLibrary& fonts, const std::string& text, int right,
                  int bottom) {
     const TextMask mask = fonts.Render(Face::ComicRegular, text, 16.0f);
-    DrawLabel(target, fonts, Face::ComicRegular, text,
-              static_cast<float>(right) - mask.advance, static_cast<float>(bottom - 5), kCaption);
+    DrawLabel(target, fonts, Face::ComicRegular, text, static_cast<float>(right) - mask.advance,
+              static_cast<float>(bottom - 5), kCaption);
 }
 
 // A plate with its label: text rectangle from (-5, 10) to (width - 5, height + 10), centred,
 // moved by two pixels when pressed.
-void DrawPlate(Art& art, Picture& target, const FontLibrary& fonts, int id, int x, int y,
-               int state, Face face, const std::string& label) {
+void DrawPlate(Art& art, Picture& target, const FontLibrary& fonts, int id, int x, int y, int state,
+               Face face, const std::string& label) {
     const Picture& plate = art.Bitmap(id);
     MaskedBlend(plate, 0, 0, target, x, y, art.Bitmap(kOpaqueMaskId), 0, 0, target, x, y,
                 plate.width, plate.height);
@@ -106,7 +108,7 @@ Picture MainMockup(Art& art, const FontLibrary& fonts) {
         int x;
         int y;
     };
-    const Placed buttons[] = {{11, 9, 346}, {0, 186, 162}, {7, 330, 268},
+    const Placed buttons[] = {{11, 9, 346},  {0, 186, 162}, {7, 330, 268},
                               {6, 272, 225}, {9, 372, 323}, {10, 405, 411}};
     for (const Placed& b : buttons) DrawFace(art, screen, b.key, 0, b.x, b.y);
     DrawCaption(screen, fonts, "Install", 187, 237);
@@ -134,7 +136,8 @@ Picture PanelMockup(Art& art, const FontLibrary& fonts) {
     DrawCaption(screen, fonts, "Mehr Vemo-Spiele", 329, 332);
     DrawCaption(screen, fonts, "Weitere Informationen", 370, 391);
     DrawCaption(screen, fonts, "Beenden", 398, 443);
-    DrawPlate(art, screen, fonts, 358, 416, 28, 0, Face::ComicRegular, "Elektronische Registrierung");
+    DrawPlate(art, screen, fonts, 358, 416, 28, 0, Face::ComicRegular,
+              "Elektronische Registrierung");
     DrawPlate(art, screen, fonts, 348, 416, 81, 2, Face::ComicRegular, "Trivex");
     DrawPlate(art, screen, fonts, 357, 416, 133, 1, Face::ComicRegular, "Liesmich");
     return screen;
@@ -148,12 +151,20 @@ Picture ListMockup(Art& art, const FontLibrary& fonts) {
     };
     // The twelve-language edition, in creation order (plate key 11 onwards).
     const Entry entries[] = {
-        {Face::ComicRegular, "Polski"},     {Face::ComicRegular, "Fran\xC3\xA7" "ais"},
-        {Face::ComicRegular, "Deutsch"},    {Face::ComicRegular, "Italiano"},
-        {Face::ComicRegular, "Svenska"},    {Face::ComicRegular, "Nederlands"},
-        {Face::ComicRegular, "Espa\xC3\xB1ol"}, {Face::ComicRegular, "Portugu\xC3\xAAs(BR)"},
-        {Face::ComicRegular, "English"},    {Face::ComicRegular, "Norsk"},
-        {Face::ComicRegular, "Suomeksi"},   {Face::ComicRegular, "Dansk"},
+        {Face::ComicRegular, "Polski"},
+        {Face::ComicRegular,
+         "Fran\xC3\xA7"
+         "ais"},
+        {Face::ComicRegular, "Deutsch"},
+        {Face::ComicRegular, "Italiano"},
+        {Face::ComicRegular, "Svenska"},
+        {Face::ComicRegular, "Nederlands"},
+        {Face::ComicRegular, "Espa\xC3\xB1ol"},
+        {Face::ComicRegular, "Portugu\xC3\xAAs(BR)"},
+        {Face::ComicRegular, "English"},
+        {Face::ComicRegular, "Norsk"},
+        {Face::ComicRegular, "Suomeksi"},
+        {Face::ComicRegular, "Dansk"},
     };
     for (size_t i = 0; i < 12; ++i) {
         const PlateResource& plate = PlateResources()[11 + i];
@@ -172,13 +183,19 @@ struct Place {
 
 Place FacePlace(int key) {
     switch (key) {
-        case 6: return {272, 225};
+        case 6:
+            return {272, 225};
         case 7:
-        case 8: return {330, 268};
-        case 9: return {372, 323};
-        case 10: return {405, 411};
-        case 11: return {9, 346};
-        default: return {186, 162};
+        case 8:
+            return {330, 268};
+        case 9:
+            return {372, 323};
+        case 10:
+            return {405, 411};
+        case 11:
+            return {9, 346};
+        default:
+            return {186, 162};
     }
 }
 
@@ -228,11 +245,30 @@ Picture ButtonSheet(Art& art, const FontLibrary& fonts) {
 // Every plate, normal, pressed and hover, with a label of the kind it carries.
 Picture PlateSheet(Art& art, const FontLibrary& fonts) {
     const char* labels[] = {
-        "The Vemo 2 PC", "The Vemo 2 Duskaro", "The Vemo 2 Lorrel", "",
-        "Electronic Registration", "Trivex", "Readme", "",
-        "The Vemo 1024x768", "The Vemo 800x600", "The Vemo Creator",
-        "Polski", "Fran\xC3\xA7" "ais", "Deutsch", "Italiano", "Svenska", "Nederlands",
-        "Espa\xC3\xB1ol", "Portugu\xC3\xAAs(BR)", "English", "Norsk", "Suomeksi", "Dansk",
+        "The Vemo 2 PC",
+        "The Vemo 2 Duskaro",
+        "The Vemo 2 Lorrel",
+        "",
+        "Electronic Registration",
+        "Trivex",
+        "Readme",
+        "",
+        "The Vemo 1024x768",
+        "The Vemo 800x600",
+        "The Vemo Creator",
+        "Polski",
+        "Fran\xC3\xA7"
+        "ais",
+        "Deutsch",
+        "Italiano",
+        "Svenska",
+        "Nederlands",
+        "Espa\xC3\xB1ol",
+        "Portugu\xC3\xAAs(BR)",
+        "English",
+        "Norsk",
+        "Suomeksi",
+        "Dansk",
     };
     const int gap = 6;
     const int columnWidth = 212 + gap;
@@ -267,10 +303,8 @@ int main(int argc, char** argv) {
     Art art(argv[1]);
     const std::string out = argv[2];
     const std::pair<std::string, Picture> previews[] = {
-        {"mockup-main.bmp", MainMockup(art, fonts)},
-        {"mockup-panel.bmp", PanelMockup(art, fonts)},
-        {"mockup-list.bmp", ListMockup(art, fonts)},
-        {"buttons.bmp", ButtonSheet(art, fonts)},
+        {"mockup-main.bmp", MainMockup(art, fonts)}, {"mockup-panel.bmp", PanelMockup(art, fonts)},
+        {"mockup-list.bmp", ListMockup(art, fonts)}, {"buttons.bmp", ButtonSheet(art, fonts)},
         {"plates.bmp", PlateSheet(art, fonts)},
     };
     if (art.failed) return 1;

@@ -67,13 +67,17 @@ void PaintPuff(Canvas& canvas, const SkyLight& light, const Puff& puff, float ha
     const Box box = {static_cast<int>(c.x - r) - 2, static_cast<int>(c.y - r) - 2,
                      static_cast<int>(c.x + r) + 3, static_cast<int>(c.y + r) + 3};
     FillSdf(
-        canvas, [&](float x, float y) { return SdCircle({x, y}, c, r); }, shader, box, 1.0f,
-        Blend::Over, 1.6f);
+        canvas,
+        [&](float x, float y) {
+            return SdCircle({x, y}, c, r);
+        },
+        shader, box, 1.0f, Blend::Over, 1.6f);
 }
 
 void PaintSparkle(Canvas& canvas, Vec2 at, float size, float alpha, Rgb color) {
-    const Box box = {static_cast<int>(at.x - size * 2.0f) - 2, static_cast<int>(at.y - size * 2.0f) - 2,
-                     static_cast<int>(at.x + size * 2.0f) + 3, static_cast<int>(at.y + size * 2.0f) + 3};
+    const Box box = {
+        static_cast<int>(at.x - size * 2.0f) - 2, static_cast<int>(at.y - size * 2.0f) - 2,
+        static_cast<int>(at.x + size * 2.0f) + 3, static_cast<int>(at.y + size * 2.0f) + 3};
     PaintBox(
         canvas, box,
         [&](float x, float y) {
@@ -83,8 +87,11 @@ void PaintSparkle(Canvas& canvas, Vec2 at, float size, float alpha, Rgb color) {
         Blend::Screen);
     const std::vector<Vec2> star = StarPoints(at, size, size * 0.2f, 4, 0.0f);
     FillSdf(
-        canvas, [&](float x, float y) { return SdPolygon({x, y}, star); }, Hex(0xFFFFFF), box,
-        alpha);
+        canvas,
+        [&](float x, float y) {
+            return SdPolygon({x, y}, star);
+        },
+        Hex(0xFFFFFF), box, alpha);
 }
 
 TextStyle GreetingStyle() {
@@ -105,7 +112,8 @@ TextStyle GreetingStyle() {
 }
 
 void PaintGlobe(Canvas& canvas, Vec2 centre, float radius, uint32_t seed) {
-    const Box box = {static_cast<int>(centre.x - radius * 2.2f), static_cast<int>(centre.y - radius * 2.0f),
+    const Box box = {static_cast<int>(centre.x - radius * 2.2f),
+                     static_cast<int>(centre.y - radius * 2.0f),
                      static_cast<int>(centre.x + radius * 2.2f) + 1,
                      static_cast<int>(centre.y + radius * 2.0f) + 1};
     PaintBox(
@@ -150,8 +158,7 @@ void PaintGlobe(Canvas& canvas, Vec2 centre, float radius, uint32_t seed) {
         const float longitude = std::atan2(nx, nz) + 0.7f;
         const float latitude = std::asin(Clamp(ny, -1.0f, 1.0f));
         Rgb ocean = Mix(Hex(0x10306E), Hex(0x3C8BE0), lambert);
-        const float landNoise =
-            Fbm(longitude * 1.6f + 11.0f, latitude * 2.4f + 3.0f, 5, seed);
+        const float landNoise = Fbm(longitude * 1.6f + 11.0f, latitude * 2.4f + 3.0f, 5, seed);
         const float land = Smoothstep(0.53f, 0.56f, landNoise);
         const Rgb ground = Mix(Hex(0x2E6E4A), Hex(0xA8D878), lambert) *
                            (0.9f + 0.2f * Fbm(longitude * 6.0f, latitude * 6.0f, 3, seed + 9));
@@ -164,11 +171,17 @@ void PaintGlobe(Canvas& canvas, Vec2 centre, float radius, uint32_t seed) {
         return Tint{color};
     };
     FillSdf(
-        canvas, [&](float x, float y) { return SdCircle({x, y}, centre, radius); }, sphere, box);
+        canvas,
+        [&](float x, float y) {
+            return SdCircle({x, y}, centre, radius);
+        },
+        sphere, box);
     const Vec2 shine = centre + Vec2{-radius * 0.36f, -radius * 0.42f};
     FillSdf(
         canvas,
-        [&](float x, float y) { return SdEllipse({x, y}, shine, {radius * 0.42f, radius * 0.26f}); },
+        [&](float x, float y) {
+            return SdEllipse({x, y}, shine, {radius * 0.42f, radius * 0.26f});
+        },
         [&](float, float y) {
             const float t = Clamp01((y - (shine.y - radius * 0.26f)) / (radius * 0.52f));
             return Tint{Hex(0xFFFFFF), 0.55f * (1.0f - t)};
@@ -187,8 +200,8 @@ void PaintGlobe(Canvas& canvas, Vec2 centre, float radius, uint32_t seed) {
 
 Rgb SkyColor(const SkyLight& light, float x, float y) {
     static const std::vector<Stop> kStops = {
-        {0.0f, Hex(0x1E2C6C)},  {0.3f, Hex(0x385CAA)},  {0.55f, Hex(0x7096D4)},
-        {0.76f, Hex(0xB2BEE6)}, {0.9f, Hex(0xE8D2E0)},  {1.0f, Hex(0xFFDEC4)},
+        {0.0f, Hex(0x1E2C6C)},  {0.3f, Hex(0x385CAA)}, {0.55f, Hex(0x7096D4)},
+        {0.76f, Hex(0xB2BEE6)}, {0.9f, Hex(0xE8D2E0)}, {1.0f, Hex(0xFFDEC4)},
         {1.2f, Hex(0xFFE8CE)},
     };
     Rgb color = Gradient(kStops, y / light.horizon);
@@ -218,9 +231,9 @@ void PaintStars(Canvas& canvas, Box area, int count, uint32_t seed) {
     for (int i = 0; i < count; ++i) {
         const Vec2 at = {random.Range(static_cast<float>(area.x0), static_cast<float>(area.x1)),
                          random.Range(static_cast<float>(area.y0), static_cast<float>(area.y1))};
-        const float fade = std::pow(1.0f - (at.y - static_cast<float>(area.y0)) /
-                                               static_cast<float>(area.y1 - area.y0),
-                                    1.3f);
+        const float fade = std::pow(
+            1.0f - (at.y - static_cast<float>(area.y0)) / static_cast<float>(area.y1 - area.y0),
+            1.3f);
         const float brightness = random.Range(0.35f, 1.0f) * fade;
         const float size = random.Range(0.45f, 1.1f);
         if (i % 14 == 0) {
@@ -230,7 +243,10 @@ void PaintStars(Canvas& canvas, Box area, int count, uint32_t seed) {
         const Box box = {static_cast<int>(at.x) - 3, static_cast<int>(at.y) - 3,
                          static_cast<int>(at.x) + 4, static_cast<int>(at.y) + 4};
         FillSdf(
-            canvas, [&](float x, float y) { return SdCircle({x, y}, at, size); },
+            canvas,
+            [&](float x, float y) {
+                return SdCircle({x, y}, at, size);
+            },
             Mix(Hex(0xFFFFFF), Hex(0xFFE8B0), random.Unit() * 0.5f), box, brightness,
             Blend::Screen);
     }
@@ -239,16 +255,21 @@ void PaintStars(Canvas& canvas, Box area, int count, uint32_t seed) {
 void PaintSun(Canvas& canvas, const SkyLight& light, float radius) {
     const Vec2 sun = light.sun;
     PaintBox(
-        canvas, Grow({static_cast<int>(sun.x), static_cast<int>(sun.y), static_cast<int>(sun.x),
-                      static_cast<int>(sun.y)},
-                     static_cast<int>(radius * 6.0f)),
+        canvas,
+        Grow({static_cast<int>(sun.x), static_cast<int>(sun.y), static_cast<int>(sun.x),
+              static_cast<int>(sun.y)},
+             static_cast<int>(radius * 6.0f)),
         [&](float x, float y) {
             const float d = Length(Vec2{x, y} - sun) / radius;
-            return Tint{Hex(0xFFF2D2), 0.8f * std::exp(-d * d * 0.35f) + 0.25f * std::exp(-d * 0.6f)};
+            return Tint{Hex(0xFFF2D2),
+                        0.8f * std::exp(-d * d * 0.35f) + 0.25f * std::exp(-d * 0.6f)};
         },
         Blend::Screen);
     FillSdf(
-        canvas, [&](float x, float y) { return SdCircle({x, y}, sun, radius); },
+        canvas,
+        [&](float x, float y) {
+            return SdCircle({x, y}, sun, radius);
+        },
         [&](float x, float y) {
             const float d = Length(Vec2{x, y} - sun) / radius;
             return Tint{Mix(Hex(0xFFFFFA), Hex(0xFFE9B0), d * d)};
@@ -280,8 +301,7 @@ void PaintCloudBank(Canvas& canvas, const SkyLight& light, const CloudBankSpec& 
     for (float x = spec.x0; x < spec.x1;) {
         const float t = (x - spec.x0) / (spec.x1 - spec.x0);
         const float bell = std::pow(std::sin(kPi * Clamp01(t)), 0.6f);
-        const float r =
-            Lerp(spec.minRadius, spec.maxRadius, bell * random.Range(0.4f, 1.0f));
+        const float r = Lerp(spec.minRadius, spec.maxRadius, bell * random.Range(0.4f, 1.0f));
         const float cy = spec.base - r * random.Range(0.25f, 0.8f);
         puffs.push_back({{x, cy}, r});
         if (bell > 0.5f && random.Unit() < 0.55f) {
@@ -348,8 +368,8 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
     for (int i = steps - 1; i >= 1; --i) {
         const float t = static_cast<float>(i) / static_cast<float>(steps);
         const float jag = random.Range(-0.07f, 0.07f) * hw * (1.0f - t);
-        outline.push_back({Lerp(cx + hw, tip.x, 1.0f - std::pow(1.0f - t, 1.2f)) + jag,
-                           ty + d * t * 0.9f});
+        outline.push_back(
+            {Lerp(cx + hw, tip.x, 1.0f - std::pow(1.0f - t, 1.2f)) + jag, ty + d * t * 0.9f});
     }
     outline.push_back({cx + hw, ty});
     const Box box = {static_cast<int>(cx - hw) - 4, static_cast<int>(ty - 60.0f * s) - 4,
@@ -382,7 +402,10 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
     }
 
     FillSdf(
-        canvas, [&](float x, float y) { return SdPolygon({x, y}, outline); },
+        canvas,
+        [&](float x, float y) {
+            return SdPolygon({x, y}, outline);
+        },
         [&](float x, float y) {
             const float t = Clamp01((y - ty) / d);
             Rgb color = Mix(Hex(0xC8977F), Hex(0x54467A), Smoothstep(0.0f, 1.0f, t));
@@ -396,7 +419,10 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
 
     const Vec2 grassRadii = {hw * 1.03f, hw * 0.16f + 2.0f};
     FillSdf(
-        canvas, [&](float x, float y) { return SdEllipse({x, y}, spec.top, grassRadii); },
+        canvas,
+        [&](float x, float y) {
+            return SdEllipse({x, y}, spec.top, grassRadii);
+        },
         [&](float x, float y) {
             const float t = Clamp01((y - (ty - grassRadii.y)) / (2.0f * grassRadii.y));
             Rgb color = Mix(Hex(0xB4E07E), Hex(0x4E9A5C), t);
@@ -413,7 +439,8 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
         FillSdf(
             canvas,
             [&](float px, float py) {
-                return SdRoundBox({px, py}, {x, ground - 5.0f * size}, {1.4f * size, 5.0f * size}, 0.8f);
+                return SdRoundBox({px, py}, {x, ground - 5.0f * size}, {1.4f * size, 5.0f * size},
+                                  0.8f);
             },
             haze(Hex(0x6A4A3A), x, ground), box);
         const Vec2 crown = {x, ground - 13.0f * size};
@@ -449,10 +476,13 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
                 return Tint{haze(Mix(Hex(0xB9B4CF), Hex(0xFFF8EC), side), x, y)};
             },
             box);
-        const std::vector<Vec2> roof = {{tx, top - 14.0f * s}, {tx + 8.0f * s, top + 1.0f},
-                                        {tx - 8.0f * s, top + 1.0f}};
+        const std::vector<Vec2> roof = {
+            {tx, top - 14.0f * s}, {tx + 8.0f * s, top + 1.0f}, {tx - 8.0f * s, top + 1.0f}};
         FillSdf(
-            canvas, [&](float x, float y) { return SdPolygon({x, y}, roof); },
+            canvas,
+            [&](float x, float y) {
+                return SdPolygon({x, y}, roof);
+            },
             [&](float x, float y) {
                 const float side = Clamp01((x - tx) / (8.0f * s) * sunSide * 0.5f + 0.5f);
                 return Tint{haze(Mix(Hex(0x2C4C9C), Hex(0x6C96E6), side), x, y)};
@@ -484,7 +514,8 @@ void PaintBirds(Canvas& canvas, Vec2 at, float scale, uint32_t seed) {
                 const Vec2 p = {x, y};
                 const Vec2 middle = c + Vec2{0.0f, 1.2f * scale};
                 const float left = SdSegment(p, c + Vec2{-span, -lift}, middle, 0.55f * scale);
-                const float right = SdSegment(p, middle, c + Vec2{span, -lift * 1.2f}, 0.55f * scale);
+                const float right =
+                    SdSegment(p, middle, c + Vec2{span, -lift * 1.2f}, 0.55f * scale);
                 return std::min(left, right);
             },
             Hex(0x3A426E), box, 0.7f);
@@ -522,8 +553,7 @@ void PaintLogo(Canvas& canvas, const FontLibrary& fonts, Vec2 at, float scale) {
     DrawText(canvas, the, at.x + 5.0f * scale, at.y + 24.0f * scale, smallStyle);
     DrawText(canvas, vemo, at.x, at.y + 80.0f * scale, vemoStyle);
     DrawText(canvas, title, at.x + 4.0f * scale, at.y + 106.0f * scale, smallStyle);
-    const float vemoRight =
-        at.x + static_cast<float>(vemo.ink.x1 - vemo.originX) + 4.0f * scale;
+    const float vemoRight = at.x + static_cast<float>(vemo.ink.x1 - vemo.originX) + 4.0f * scale;
     PaintSparkle(canvas, {vemoRight, at.y + 30.0f * scale}, 9.0f * scale, 1.0f, Hex(0xFFF6D0));
     PaintSparkle(canvas, {vemoRight + 14.0f * scale, at.y + 46.0f * scale}, 4.5f * scale, 0.9f,
                  Hex(0xFFF6D0));
@@ -707,10 +737,10 @@ const std::vector<Box>& LanguageNeutralBoxes() {
             int x, y, w, h;
         };
         const Rect rects[] = {
-            {9, 346, 162, 117},  {186, 162, 85, 96},  {330, 268, 73, 79},  {272, 225, 66, 67},
-            {372, 323, 73, 87},  {405, 411, 54, 54},  {271, 55, 240, 149}, {403, 67, 237, 256},
-            {403, 54, 237, 252}, {295, 19, 209, 49},  {295, 71, 209, 49},  {295, 123, 209, 49},
-            {416, 28, 209, 49},  {416, 81, 209, 49},  {416, 133, 209, 49}, {416, 185, 209, 49},
+            {9, 346, 162, 117},  {186, 162, 85, 96}, {330, 268, 73, 79},  {272, 225, 66, 67},
+            {372, 323, 73, 87},  {405, 411, 54, 54}, {271, 55, 240, 149}, {403, 67, 237, 256},
+            {403, 54, 237, 252}, {295, 19, 209, 49}, {295, 71, 209, 49},  {295, 123, 209, 49},
+            {416, 28, 209, 49},  {416, 81, 209, 49}, {416, 133, 209, 49}, {416, 185, 209, 49},
             {416, 29, 209, 49},
         };
         std::vector<Box> boxes;

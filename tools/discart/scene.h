@@ -20,16 +20,16 @@ struct SkyLight {
 struct CloudBankSpec {
     float x0 = 0.0f;
     float x1 = 0.0f;
-    float base = 0.0f;       // y of the flat underside
+    float base = 0.0f;  // y of the flat underside
     float minRadius = 10.0f;
     float maxRadius = 20.0f;
-    float haze = 0.0f;       // 0 near, 1 lost in the sky
+    float haze = 0.0f;  // 0 near, 1 lost in the sky
     bool flatBottom = true;
     uint32_t seed = 1;
 };
 
 struct IslandSpec {
-    Vec2 top;                // centre of the grass top
+    Vec2 top;  // centre of the grass top
     float halfWidth = 50.0f;
     float depth = 70.0f;
     float haze = 0.0f;
@@ -46,8 +46,7 @@ void PaintSun(Canvas& canvas, const SkyLight& light, float radius);
 void PaintCirrus(Canvas& canvas, const SkyLight& light, Box area, uint32_t seed);
 void PaintCloudBank(Canvas& canvas, const SkyLight& light, const CloudBankSpec& spec);
 // Rows of clouds from the horizon down to the bottom edge; rows from firstRow on only.
-void PaintCloudSea(Canvas& canvas, const SkyLight& light, int firstRow, int lastRow,
-                   uint32_t seed);
+void PaintCloudSea(Canvas& canvas, const SkyLight& light, int firstRow, int lastRow, uint32_t seed);
 void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec);
 void PaintBirds(Canvas& canvas, Vec2 at, float scale, uint32_t seed);
 

@@ -11,7 +11,9 @@ namespace {
 
 constexpr double kTwoPi = 6.283185307179586;
 
-double MidiFrequency(int note) { return 440.0 * std::pow(2.0, (note - 69) / 12.0); }
+double MidiFrequency(int note) {
+    return 440.0 * std::pow(2.0, (note - 69) / 12.0);
+}
 
 // Scales to the given peak and fades both ends, so that nothing clips and nothing pops.
 std::vector<int16_t> Finish(std::vector<double> signal, double peak, double fadeIn,
@@ -134,10 +136,10 @@ std::vector<int16_t> SynthesiseClick() {
 std::vector<int16_t> SynthesiseStartupMusic() {
     const double length = 5.6;
     std::vector<double> music(static_cast<size_t>(length * kSampleRate), 0.0);
-    const std::vector<Partial> harp = {{1.0, 1.0, 0.55}, {2.0, 0.45, 0.3}, {3.0, 0.2, 0.18},
-                                       {4.0, 0.1, 0.12}};
-    const std::vector<Partial> bell = {{1.0, 1.0, 1.1}, {2.0, 0.35, 0.6}, {3.0, 0.12, 0.35},
-                                       {4.07, 0.08, 0.2}};
+    const std::vector<Partial> harp = {
+        {1.0, 1.0, 0.55}, {2.0, 0.45, 0.3}, {3.0, 0.2, 0.18}, {4.0, 0.1, 0.12}};
+    const std::vector<Partial> bell = {
+        {1.0, 1.0, 1.1}, {2.0, 0.35, 0.6}, {3.0, 0.12, 0.35}, {4.07, 0.08, 0.2}};
     const std::vector<Partial> bass = {{1.0, 1.0, 1.2}, {2.0, 0.3, 0.5}};
 
     const int flourish[] = {62, 66, 69, 74, 78, 81};
@@ -154,9 +156,11 @@ std::vector<int16_t> SynthesiseStartupMusic() {
         {0.70, 81, 0.55}, {1.15, 83, 0.42}, {1.37, 81, 0.42}, {1.59, 78, 0.5},  {2.04, 74, 0.5},
         {2.49, 76, 0.5},  {2.94, 78, 0.42}, {3.16, 79, 0.42}, {3.38, 81, 0.55},
     };
-    for (const Note& n : melody) AddTone(music, n.start, MidiFrequency(n.note), n.velocity, bell, 0.003, 2.2);
+    for (const Note& n : melody)
+        AddTone(music, n.start, MidiFrequency(n.note), n.velocity, bell, 0.003, 2.2);
     const Note closing[] = {{3.62, 74, 0.32}, {3.69, 78, 0.3}, {3.76, 81, 0.3}, {3.83, 86, 0.34}};
-    for (const Note& n : closing) AddTone(music, n.start, MidiFrequency(n.note), n.velocity, harp, 0.004, 2.0);
+    for (const Note& n : closing)
+        AddTone(music, n.start, MidiFrequency(n.note), n.velocity, harp, 0.004, 2.0);
     AddTone(music, 3.83, MidiFrequency(86), 0.25, bell, 0.003, 1.77);
 
     AddPad(music, 0.6, 1.8, {62, 66, 69}, 0.035);

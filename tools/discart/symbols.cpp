@@ -8,8 +8,12 @@ namespace {
 
 constexpr Rgb kInk = Hex(0x1A2462);
 
-float Union(float a, float b) { return std::min(a, b); }
-float Subtract(float a, float b) { return std::max(a, -b); }
+float Union(float a, float b) {
+    return std::min(a, b);
+}
+float Subtract(float a, float b) {
+    return std::max(a, -b);
+}
 
 // Arc of a ring, open at the top over +-gap radians, with round ends.
 float SdOpenRing(Vec2 p, float radius, float halfWidth, float gap) {
@@ -40,7 +44,9 @@ void SymbolPen::Fill(const UnitSdf& sdf, const UnitShader& shader, float alpha) 
     const float s = scale;
     FillSdf(
         canvas,
-        [&](float x, float y) { return sdf({(x - c.x) / s, (y - c.y) / s}) * s; },
+        [&](float x, float y) {
+            return sdf({(x - c.x) / s, (y - c.y) / s}) * s;
+        },
         [&](float x, float y) {
             return shader({(x - c.x) / s, (y - c.y) / s});
         },
@@ -51,27 +57,30 @@ void SymbolPen::Fill(const UnitSdf& sdf, const UnitShader& shader, float alpha) 
 }
 
 void SymbolPen::Fill(const UnitSdf& sdf, Rgb color, float alpha) {
-    Fill(sdf, [color](Vec2) { return Tint{color}; }, alpha);
+    Fill(
+        sdf, [color](Vec2) { return Tint{color}; }, alpha);
 }
 
 UnitShader SymbolFace() {
-    return [](Vec2 p) { return Tint{Mix(Hex(0xFFFFFF), Hex(0xFFE4AE), Clamp01(p.y * 0.6f + 0.5f))}; };
+    return
+        [](Vec2 p) { return Tint{Mix(Hex(0xFFFFFF), Hex(0xFFE4AE), Clamp01(p.y * 0.6f + 0.5f))}; };
 }
 
 void InstallSymbol(SymbolPen& pen) {
     const Vec2 disc = {0.0f, -0.3f};
-    pen.Fill([disc](Vec2 p) { return Subtract(SdCircle(p, disc, 0.36f), SdCircle(p, disc, 0.08f)); },
-             [disc](Vec2 p) {
-                 // A silvery disc with a rainbow sheen that turns with the angle.
-                 const Vec2 d = p - disc;
-                 const float angle = std::atan2(d.y, d.x);
-                 const Rgb sheen = {0.5f + 0.5f * std::cos(angle * 2.0f),
-                                    0.5f + 0.5f * std::cos(angle * 2.0f + 2.1f),
-                                    0.5f + 0.5f * std::cos(angle * 2.0f + 4.2f)};
-                 Rgb color = Mix(Hex(0xF2F4FA), sheen, 0.35f);
-                 color = Mix(color, Hex(0x9AA4C4), Smoothstep(0.3f, 0.36f, Length(d)) * 0.6f);
-                 return Tint{color};
-             });
+    pen.Fill(
+        [disc](Vec2 p) { return Subtract(SdCircle(p, disc, 0.36f), SdCircle(p, disc, 0.08f)); },
+        [disc](Vec2 p) {
+            // A silvery disc with a rainbow sheen that turns with the angle.
+            const Vec2 d = p - disc;
+            const float angle = std::atan2(d.y, d.x);
+            const Rgb sheen = {0.5f + 0.5f * std::cos(angle * 2.0f),
+                               0.5f + 0.5f * std::cos(angle * 2.0f + 2.1f),
+                               0.5f + 0.5f * std::cos(angle * 2.0f + 4.2f)};
+            Rgb color = Mix(Hex(0xF2F4FA), sheen, 0.35f);
+            color = Mix(color, Hex(0x9AA4C4), Smoothstep(0.3f, 0.36f, Length(d)) * 0.6f);
+            return Tint{color};
+        });
     const auto tray = [](Vec2 p) {
         return Subtract(SdRoundBox(p, {0.0f, 0.42f}, {0.54f, 0.17f}, 0.08f),
                         SdRoundBox(p, {0.0f, 0.33f}, {0.4f, 0.14f}, 0.04f));
@@ -79,7 +88,8 @@ void InstallSymbol(SymbolPen& pen) {
     pen.Fill(tray, SymbolFace());
     const std::vector<Vec2> head = {{-0.27f, 0.08f}, {0.27f, 0.08f}, {0.0f, 0.4f}};
     const auto arrow = [head](Vec2 p) {
-        return Union(SdRoundBox(p, {0.0f, -0.12f}, {0.1f, 0.24f}, 0.04f), SdPolygon(p, head) - 0.02f);
+        return Union(SdRoundBox(p, {0.0f, -0.12f}, {0.1f, 0.24f}, 0.04f),
+                     SdPolygon(p, head) - 0.02f);
     };
     pen.Fill([arrow](Vec2 p) { return arrow(p) - 0.06f; }, kInk, 0.85f);
     pen.Fill(arrow, [](Vec2 p) {
@@ -87,13 +97,22 @@ void InstallSymbol(SymbolPen& pen) {
     });
 }
 
-void PlaySymbol(SymbolPen& pen) { DrawPlay(pen, {0.05f, 0.0f}, 1.0f); }
+void PlaySymbol(SymbolPen& pen) {
+    DrawPlay(pen, {0.05f, 0.0f}, 1.0f);
+}
 
-void PlaySymbolRaised(SymbolPen& pen) { DrawPlay(pen, {0.05f, -0.14f}, 0.84f); }
+void PlaySymbolRaised(SymbolPen& pen) {
+    DrawPlay(pen, {0.05f, -0.14f}, 0.84f);
+}
 
 void GlobeSymbol(SymbolPen& pen) {
-    pen.Fill([](Vec2 p) { return SdCircle(p, {0.0f, 0.0f}, 0.58f); },
-             [](Vec2 p) { return Tint{Hex(0xFFFFFF), 0.16f + 0.1f * Clamp01(-p.y)}; });
+    pen.Fill(
+        [](Vec2 p) {
+            return SdCircle(p, {0.0f, 0.0f}, 0.58f);
+        },
+        [](Vec2 p) {
+            return Tint{Hex(0xFFFFFF), 0.16f + 0.1f * Clamp01(-p.y)};
+        });
     pen.Fill(
         [](Vec2 p) {
             const float inside = SdCircle(p, {0.0f, 0.0f}, 0.56f);
@@ -130,11 +149,11 @@ void GamepadSymbol(SymbolPen& pen) {
 
 void StarSymbol(SymbolPen& pen) {
     const std::vector<Vec2> star = StarPoints({0.0f, 0.04f}, 0.56f, 0.25f, 5, 0.0f);
-    pen.Fill([star](Vec2 p) { return SdPolygon(p, star) - 0.05f; }, [](Vec2 p) {
-        return Tint{Mix(Hex(0xFFF7C0), Hex(0xF6A21E), Clamp01(p.y * 0.9f + 0.5f))};
-    });
-    pen.Fill([star](Vec2 p) { return std::fabs(SdPolygon(p, star) - 0.05f) - 0.025f; }, Hex(0xFFFFFF),
-             0.7f);
+    pen.Fill(
+        [star](Vec2 p) { return SdPolygon(p, star) - 0.05f; },
+        [](Vec2 p) { return Tint{Mix(Hex(0xFFF7C0), Hex(0xF6A21E), Clamp01(p.y * 0.9f + 0.5f))}; });
+    pen.Fill([star](Vec2 p) { return std::fabs(SdPolygon(p, star) - 0.05f) - 0.025f; },
+             Hex(0xFFFFFF), 0.7f);
 }
 
 void BookSymbol(SymbolPen& pen) {
@@ -142,10 +161,10 @@ void BookSymbol(SymbolPen& pen) {
                                      {0.64f, 0.44f},   {0.0f, 0.52f},  {-0.64f, 0.44f}};
     pen.Fill([cover](Vec2 p) { return SdPolygon(p, cover) - 0.03f; },
              [](Vec2) { return Tint{Hex(0xF5B23A)}; });
-    const std::vector<Vec2> left = {{-0.58f, -0.36f}, {-0.03f, -0.25f}, {-0.03f, 0.4f},
-                                    {-0.58f, 0.3f}};
-    const std::vector<Vec2> right = {{0.58f, -0.36f}, {0.03f, -0.25f}, {0.03f, 0.4f},
-                                     {0.58f, 0.3f}};
+    const std::vector<Vec2> left = {
+        {-0.58f, -0.36f}, {-0.03f, -0.25f}, {-0.03f, 0.4f}, {-0.58f, 0.3f}};
+    const std::vector<Vec2> right = {
+        {0.58f, -0.36f}, {0.03f, -0.25f}, {0.03f, 0.4f}, {0.58f, 0.3f}};
     pen.Fill([left](Vec2 p) { return SdPolygon(p, left) - 0.02f; }, SymbolFace());
     pen.Fill([right](Vec2 p) { return SdPolygon(p, right) - 0.02f; }, SymbolFace());
     pen.Fill(

@@ -13,13 +13,13 @@ using UnitShader = std::function<Tint(Vec2 p)>;
 
 // Draws symbol shapes given in units onto a canvas.
 class SymbolPen {
-public:
+  public:
     SymbolPen(Canvas& canvas, Vec2 centre, float scale);
 
     void Fill(const UnitSdf& sdf, const UnitShader& shader, float alpha = 1.0f);
     void Fill(const UnitSdf& sdf, Rgb color, float alpha = 1.0f);
 
-private:
+  private:
     Canvas& canvas;
     Vec2 centre;
     float scale;

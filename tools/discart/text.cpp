@@ -68,7 +68,9 @@ bool IsThaiAboveVowel(char32_t c) {
     return c == 0x0E31 || (c >= 0x0E34 && c <= 0x0E37) || c == 0x0E47 || c == 0x0E4D;
 }
 
-bool IsThaiToneMark(char32_t c) { return c >= 0x0E48 && c <= 0x0E4C; }
+bool IsThaiToneMark(char32_t c) {
+    return c >= 0x0E48 && c <= 0x0E4C;
+}
 
 struct PlacedGlyph {
     int left = 0;
@@ -137,8 +139,8 @@ bool FontLibrary::Load(std::string& error) {
                 }
             }
             if (!face) {
-                error = std::string("font file ") + file.path + " has no face \"" + file.family +
-                        "\"";
+                error =
+                    std::string("font file ") + file.path + " has no face \"" + file.family + "\"";
                 return false;
             }
         }
@@ -246,10 +248,9 @@ TextMask FontLibrary::Render(const std::vector<TextSpan>& spans, float pixelSize
         const int oy = result.baseline - glyph.top;
         for (int row = 0; row < glyph.rows; ++row) {
             for (int column = 0; column < glyph.width; ++column) {
-                const float v =
-                    static_cast<float>(glyph.pixels[static_cast<size_t>(row) * glyph.width +
-                                                    column]) /
-                    255.0f;
+                const float v = static_cast<float>(
+                                    glyph.pixels[static_cast<size_t>(row) * glyph.width + column]) /
+                                255.0f;
                 float& dst = result.coverage.At(ox + column, oy + row);
                 dst = 1.0f - (1.0f - dst) * (1.0f - v);
             }
@@ -279,7 +280,9 @@ float FontLibrary::FitSize(const std::vector<TextSpan>& spans, float pixelSize, 
     return size;
 }
 
-float InkWidth(const TextMask& text) { return static_cast<float>(text.ink.x1 - text.ink.x0); }
+float InkWidth(const TextMask& text) {
+    return static_cast<float>(text.ink.x1 - text.ink.x0);
+}
 
 float CentredPenX(const TextMask& text, float centreX) {
     const float inkCentre =
@@ -308,7 +311,8 @@ void DrawText(Canvas& canvas, const TextMask& text, float x, float baseline,
     if (style.outlineWidth > 0.0f) PaintMask(canvas, outline, ox, oy, style.outline);
     const float top = static_cast<float>(oy + text.ink.y0);
     const float bottom = static_cast<float>(oy + text.ink.y1);
-    PaintMask(canvas, cover, ox, oy, VerticalGradient(top, style.fillTop, bottom, style.fillBottom));
+    PaintMask(canvas, cover, ox, oy,
+              VerticalGradient(top, style.fillTop, bottom, style.fillBottom));
     if (style.sheen > 0.0f) {
         const float middle = top + (bottom - top) * 0.45f;
         PaintMask(canvas, cover, ox, oy, [=](float, float y) {

@@ -51,7 +51,7 @@ struct TextStyle {
 };
 
 class FontLibrary {
-public:
+  public:
     FontLibrary();
     ~FontLibrary();
     FontLibrary(const FontLibrary&) = delete;
@@ -69,7 +69,7 @@ public:
     float FitSize(const std::vector<TextSpan>& spans, float pixelSize, float maxWidth,
                   float tracking = 0.0f) const;
 
-private:
+  private:
     struct State;
     std::unique_ptr<State> state;
 };
