@@ -47,11 +47,73 @@ struct RegistryKeyTraits {
 };
 using RegistryKey = UniqueResource<HKEY, RegistryKeyTraits>;
 
+template <typename Object>
 struct GdiObjectTraits {
-    static HGDIOBJ Empty() { return nullptr; }
-    static bool IsEmpty(HGDIOBJ object) { return object == nullptr; }
-    static void Close(HGDIOBJ object) { DeleteObject(object); }
+    static Object Empty() { return nullptr; }
+    static bool IsEmpty(Object object) { return object == nullptr; }
+    static void Close(Object object) { DeleteObject(object); }
 };
-using UniqueGdiObject = UniqueResource<HGDIOBJ, GdiObjectTraits>;
+template <typename Object>
+using UniqueGdi = UniqueResource<Object, GdiObjectTraits<Object>>;
+using UniqueGdiObject = UniqueGdi<HGDIOBJ>;
+
+struct MemoryDcTraits {
+    static HDC Empty() { return nullptr; }
+    static bool IsEmpty(HDC dc) { return dc == nullptr; }
+    static void Close(HDC dc) { DeleteDC(dc); }
+};
+using MemoryDc = UniqueResource<HDC, MemoryDcTraits>;
+
+// The device context of a window (null: the whole screen), released when it goes.
+class WindowDc {
+public:
+    explicit WindowDc(HWND window) : window_(window), dc_(GetDC(window)) {}
+    ~WindowDc() {
+        if (dc_) ReleaseDC(window_, dc_);
+    }
+    WindowDc(const WindowDc&) = delete;
+    WindowDc& operator=(const WindowDc&) = delete;
+    HDC Get() const { return dc_; }
+
+private:
+    HWND window_;
+    HDC dc_;
+};
+
+// Selects an object into a device context and puts the previous one back when it goes.
+class SelectionGuard {
+public:
+    SelectionGuard(HDC dc, HGDIOBJ object) : dc_(dc), previous_(dc && object ? SelectObject(dc, object) : nullptr) {}
+    ~SelectionGuard() {
+        if (previous_) SelectObject(dc_, previous_);
+    }
+    SelectionGuard(const SelectionGuard&) = delete;
+    SelectionGuard& operator=(const SelectionGuard&) = delete;
+
+private:
+    HDC dc_;
+    HGDIOBJ previous_;
+};
+
+// Selects a palette (as foreground palette) and realises it; the previous palette goes back
+// when the guard goes. Nothing happens for a null palette, as on true-colour displays.
+class PaletteGuard {
+public:
+    PaletteGuard(HDC dc, HPALETTE palette) : dc_(dc) {
+        if (dc && palette) {
+            previous_ = SelectPalette(dc, palette, FALSE);
+            RealizePalette(dc);
+        }
+    }
+    ~PaletteGuard() {
+        if (previous_) SelectPalette(dc_, previous_, FALSE);
+    }
+    PaletteGuard(const PaletteGuard&) = delete;
+    PaletteGuard& operator=(const PaletteGuard&) = delete;
+
+private:
+    HDC dc_;
+    HPALETTE previous_ = nullptr;
+};
 
 #endif

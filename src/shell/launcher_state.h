@@ -6,8 +6,10 @@
 
 #include <cstdint>
 
+#include "graphics/dib.h"
 #include "locale/language_table.h"
 #include "menu/menu_controller.h"
+#include "platform/handles_win.h"
 #include "shell/root_path.h"
 
 constexpr std::uint32_t kNoPanel = 3;
@@ -33,6 +35,16 @@ struct LauncherState {
     wchar_t messageCaption[kCaptionCapacity] = {};
     wchar_t messageText[kMessageCapacity] = {};
     MenuController menu;
+
+    // Graphics: the 256-colour palette (none on displays of more than 8 bits per pixel) with
+    // its colours in picture order, the cursor kept while a picture converts, the working copy
+    // of the background that panels and buttons are composited into, and the device bitmap
+    // made from it at each paint, on which captions are written.
+    UniqueGdi<HPALETTE> palette;
+    DibPtr paletteTable;
+    HCURSOR savedCursor = nullptr;
+    DibPtr workingBackground;
+    UniqueGdi<HBITMAP> backgroundBitmap;
 };
 
 extern LauncherState launcher;

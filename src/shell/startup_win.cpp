@@ -5,7 +5,7 @@
 #include <cstdlib>
 #include <string>
 
-#include "graphics/catalogue_win.h"
+#include "locale/catalogue_win.h"
 #include "locale/config_win.h"
 #include "locale/strings_win.h"
 #include "platform/handles_win.h"

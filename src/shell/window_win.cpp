@@ -1,5 +1,7 @@
 #include "shell/window_win.h"
 
+#include "graphics/painting_win.h"
+#include "platform/handles_win.h"
 #include "shell/launcher_state.h"
 
 LRESULT CALLBACK MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
@@ -18,8 +20,33 @@ LRESULT CALLBACK MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM
         case WM_PAINT: {
             launcher.menu.CheckInstallation();
             PAINTSTRUCT paint;
-            BeginPaint(window, &paint);
+            HDC dc = BeginPaint(window, &paint);
+            PaintLauncherWindow(dc);
             EndPaint(window, &paint);
+            return 0;
+        }
+        case WM_PRINTCLIENT:
+            PaintLauncherWindow(reinterpret_cast<HDC>(wParam));
+            return 0;
+        case WM_CTLCOLORBTN:
+            return 0;
+        case WM_QUERYNEWPALETTE: {
+            WindowDc dc(window);
+            // Switching the static colours off and on makes the system map the palette anew.
+            SetSystemPaletteUse(dc.Get(), SYSPAL_NOSTATIC);
+            SetSystemPaletteUse(dc.Get(), SYSPAL_STATIC);
+            HPALETTE previous = SelectPalette(dc.Get(), launcher.palette.Get(), FALSE);
+            UINT changed = RealizePalette(dc.Get());
+            SelectPalette(dc.Get(), previous, FALSE);
+            if (changed == 0 || changed == GDI_ERROR) return 0;
+            InvalidateRect(window, nullptr, TRUE);
+            return 1;
+        }
+        case WM_PALETTECHANGED: {
+            if (reinterpret_cast<HWND>(wParam) == window) return 0;
+            WindowDc dc(window);
+            PaletteGuard palette(dc.Get(), launcher.palette.Get());
+            InvalidateRect(window, nullptr, TRUE);
             return 0;
         }
         case WM_COMMAND:

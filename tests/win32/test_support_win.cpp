@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cstring>
+
 #include "platform/text_win.h"
 #include "shell/launcher_state.h"
 
@@ -122,4 +124,47 @@ bool RunningOnWine() {
 std::wstring TestProgramFolder() {
     std::wstring path = ModuleFileName();
     return path.substr(0, path.rfind(L'\\') + 1);
+}
+
+std::ostream& operator<<(std::ostream& out, const Rgb& color) {
+    return out << "(" << int(color.r) << "," << int(color.g) << "," << int(color.b) << ")";
+}
+
+std::string SolidBmpFile(int width, int height, Rgb color) {
+    const std::uint32_t stride = (static_cast<std::uint32_t>(width) * 3 + 3) & ~3u;
+    const std::uint32_t imageSize = stride * static_cast<std::uint32_t>(height);
+    std::string file(14 + 40 + imageSize, '\0');
+    auto put32 = [&](std::size_t at, std::uint32_t v) { std::memcpy(&file[at], &v, 4); };
+    auto put16 = [&](std::size_t at, std::uint16_t v) { std::memcpy(&file[at], &v, 2); };
+    file[0] = 'B';
+    file[1] = 'M';
+    put32(2, static_cast<std::uint32_t>(file.size()));
+    put32(10, 54);
+    put32(14, 40);
+    put32(18, static_cast<std::uint32_t>(width));
+    put32(22, static_cast<std::uint32_t>(height));
+    put16(26, 1);
+    put16(28, 24);
+    put32(34, imageSize);
+    for (int y = 0; y < height; ++y) {
+        for (int x = 0; x < width; ++x) {
+            std::size_t at = 54 + y * stride + x * 3;
+            file[at] = static_cast<char>(color.b);
+            file[at + 1] = static_cast<char>(color.g);
+            file[at + 2] = static_cast<char>(color.r);
+        }
+    }
+    return file;
+}
+
+Rgb TestColorOf(LanguageBase base) {
+    return {static_cast<std::uint8_t>(40 + base / 1000 * 10), 200,
+            static_cast<std::uint8_t>(base / 100)};
+}
+
+Rgb ScreenPixel(int x, int y) {
+    HDC screen = GetDC(nullptr);
+    COLORREF color = GetPixel(screen, x, y);
+    ReleaseDC(nullptr, screen);
+    return {GetRValue(color), GetGValue(color), GetBValue(color)};
 }

@@ -5,7 +5,11 @@
 
 #include <windows.h>
 
+#include <cstdint>
+#include <ostream>
 #include <string>
+
+#include "locale/language_table.h"
 
 // Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine.
 void DeleteMachineKey(const wchar_t* path);
@@ -53,6 +57,20 @@ void RemoveTree(const std::wstring& folder);
 
 // Puts the launcher's configuration fields back to their start values.
 void ResetLauncherConfiguration();
+
+struct Rgb {
+    std::uint8_t r, g, b;
+    bool operator==(const Rgb& o) const { return r == o.r && g == o.g && b == o.b; }
+    bool operator!=(const Rgb& o) const { return !(*this == o); }
+};
+std::ostream& operator<<(std::ostream& out, const Rgb& color);
+
+// A 24-bit .bmp file of one colour, as a disc would carry a background.
+std::string SolidBmpFile(int width, int height, Rgb color);
+// A colour of its own for each language, so a test can tell which background shows.
+Rgb TestColorOf(LanguageBase base);
+// The pixel at a point of the screen, as the user sees it.
+Rgb ScreenPixel(int x, int y);
 
 // Wine behaves differently from Windows in a few documented details.
 bool RunningOnWine();

@@ -2,12 +2,14 @@
 # demo runs in. STATE is the folder that holds the prefix and the display in use.
 export WINEPREFIX="$STATE/prefix"
 export WINEDEBUG=-all
-# Wine must never stop to offer its .NET or HTML engines.
-export WINEDLLOVERRIDES="mscoree,mshtml="
+# Wine must never stop to offer its .NET or HTML engines, nor hold a crashed program in its
+# debugger: a crash has to end the test, not hang it. The test machines have no sound card.
+export WINEDLLOVERRIDES="mscoree,mshtml=;winedbg.exe=d;winealsa.drv,winepulse.drv=d"
 export WINEARCH=win64
 # The launcher's system language is US English unless a test says otherwise.
 export LANG="${AUTOPLAY_TEST_LANG:-en_US.UTF-8}"
-if [ -z "${DISPLAY:-}" ] && [ -f "$STATE/display" ]; then
+# A display started for the run (none was set, or the run needs a depth of its own) wins.
+if [ -f "$STATE/display" ]; then
     DISPLAY="$(cat "$STATE/display")"
     export DISPLAY
 fi

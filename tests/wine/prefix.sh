@@ -1,17 +1,18 @@
 #!/usr/bin/env bash
 # Makes (setup) or tears down (cleanup) the Wine prefix and X display of one test run.
 #   prefix.sh setup|cleanup STATE [DEPTH]
-# A display is started with Xvfb only when none is set. Every wait here has a bound.
+# A display is started with Xvfb when none is set, or when a DEPTH is asked for (the
+# 256-colour runs). Every wait here has a bound.
 set -euo pipefail
 command=$1
 STATE=$2
-depth=${3:-24}
+depth=${3:-}
 
 start_xvfb() {
     local n
     for n in $(seq 90 160); do
         [ -e "/tmp/.X$n-lock" ] && continue
-        setsid Xvfb ":$n" -screen 0 "1024x768x$depth" -nolisten tcp </dev/null >"$STATE/xvfb.log" 2>&1 &
+        setsid Xvfb ":$n" -screen 0 "1024x768x${depth:-24}" -nolisten tcp </dev/null >"$STATE/xvfb.log" 2>&1 &
         echo $! >"$STATE/xvfb.pid"
         for _ in $(seq 1 100); do
             if [ -S "/tmp/.X11-unix/X$n" ]; then
@@ -32,16 +33,12 @@ case "$command" in
         if [ -d "$STATE" ]; then "$0" cleanup "$STATE" || true; fi
         rm -rf "$STATE"
         mkdir -p "$STATE"
-        if [ -z "${DISPLAY:-}" ]; then start_xvfb; fi
+        if [ -z "${DISPLAY:-}" ] || [ -n "$depth" ]; then start_xvfb; fi
         source "$(dirname "$0")/env.sh"
         # A persistent server keeps each test's start quick; its output must not hold
         # CTest's pipes open.
         setsid "$WINESERVER" -p </dev/null >/dev/null 2>&1 || true
         timeout 300 "$WINE" wineboot -i </dev/null >"$STATE/wineboot.log" 2>&1
-        # The launcher names Windows fonts: Wine is told which free fonts stand in for them.
-        # regedit takes names beyond ASCII only from a UTF-16 file.
-        { printf '\377\376'; sed 's/$/\r/' "$(dirname "$0")/fonts.reg" | iconv -f UTF-8 -t UTF-16LE; } >"$STATE/fonts.reg"
-        (cd "$STATE" && timeout 60 "$WINE" regedit /S fonts.reg </dev/null >>"$STATE/wineboot.log" 2>&1)
         timeout 120 "$WINESERVER" -w || true
         setsid "$WINESERVER" -p </dev/null >/dev/null 2>&1 || true
         echo "Wine prefix ready in $WINEPREFIX on display ${DISPLAY}"

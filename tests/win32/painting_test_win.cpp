@@ -1,0 +1,262 @@
+// Loading the backgrounds from the disc and painting the window, read back as pixels.
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <string>
+#include <vector>
+
+#include "graphics/dib.h"
+#include "graphics/painting_win.h"
+#include "graphics/picture_win.h"
+#include "locale/catalogue_win.h"
+#include "locale/strings_win.h"
+#include "shell/launcher_state.h"
+#include "test_support_win.h"
+
+namespace {
+
+// A 32-bit top-down memory surface the window is painted into.
+class Surface {
+public:
+    Surface(int width, int height) : width_(width), height_(height) {
+        BITMAPINFO info{};
+        info.bmiHeader.biSize = sizeof(info.bmiHeader);
+        info.bmiHeader.biWidth = width;
+        info.bmiHeader.biHeight = -height;
+        info.bmiHeader.biPlanes = 1;
+        info.bmiHeader.biBitCount = 32;
+        WindowDc screen(nullptr);
+        dc_.Reset(CreateCompatibleDC(screen.Get()));
+        bitmap_.Reset(CreateDIBSection(dc_.Get(), &info, DIB_RGB_COLORS, &bits_, nullptr, 0));
+        selected_ = SelectObject(dc_.Get(), bitmap_.Get());
+    }
+    ~Surface() { SelectObject(dc_.Get(), selected_); }
+    HDC Dc() const { return dc_.Get(); }
+    Rgb At(int x, int y) const {
+        GdiFlush();
+        const auto* pixel = static_cast<const std::uint8_t*>(bits_) + (y * width_ + x) * 4;
+        return {pixel[2], pixel[1], pixel[0]};
+    }
+
+private:
+    int width_, height_;
+    MemoryDc dc_;
+    UniqueGdi<HBITMAP> bitmap_;
+    HGDIOBJ selected_ = nullptr;
+    void* bits_ = nullptr;
+};
+
+class Painting : public testing::Test {
+protected:
+    void SetUp() override {
+        ResetLauncherConfiguration();
+        wcscpy_s(launcher.rootPath, disc.Path().c_str());
+        launcher.menu.panelOpen = false;
+        launcher.menu.installed = false;
+        launcher.openPanel = kNoPanel;
+    }
+    void TearDown() override {
+        ReleaseCatalogue();
+        launcher.rootPath[0] = L'\0';
+        launcher.menu.panelOpen = false;
+        launcher.openPanel = kNoPanel;
+    }
+
+    void WriteBackground(LanguageBase base, int width = 640, int height = 480) {
+        disc.WriteFile(FindLanguage(base)->backgroundFile, SolidBmpFile(width, height, TestColorOf(base)));
+    }
+    void WriteAllBackgrounds() {
+        for (const LanguageInfo& language : Languages()) WriteBackground(language.base);
+    }
+
+    TempFolder disc;
+};
+
+TEST_F(Painting, NoBackgroundOnTheDiscMeansNoWindowSize) {
+    LoadCatalogue();
+    EXPECT_EQ(launcher.backgroundWidth, 0);
+    EXPECT_EQ(launcher.backgroundHeight, 0);
+    EXPECT_EQ(launcher.workingBackground, nullptr);
+}
+
+TEST_F(Painting, FirstLanguageBackgroundSetsTheSize) {
+    WriteBackground(kGerman);
+    WriteBackground(kJapanese);
+    LoadBackgrounds();
+    EXPECT_EQ(launcher.backgroundWidth, 640);
+    EXPECT_EQ(launcher.backgroundHeight, 480);
+    EXPECT_EQ(catalogue.firstBackgroundKey, static_cast<std::int32_t>(kGerman));
+    EXPECT_NE(BackgroundFor(kJapanese), nullptr);
+    EXPECT_EQ(BackgroundFor(kUsEnglish), nullptr);
+    // The working copy is a picture of its own.
+    EXPECT_NE(launcher.workingBackground.get(), BackgroundFor(kGerman));
+}
+
+TEST_F(Painting, CorruptOrMismatchedBackgroundsCountAsMissing) {
+    WriteBackground(kUsEnglish);
+    WriteBackground(kFrench, 320, 240);  // another size than the first
+    std::string truncated = SolidBmpFile(640, 480, TestColorOf(kGerman));
+    truncated.resize(1000);
+    disc.WriteFile(FindLanguage(kGerman)->backgroundFile, truncated);
+    disc.WriteFile(FindLanguage(kSpanish)->backgroundFile, "BM not a picture at all");
+    std::string lying = SolidBmpFile(64, 48, TestColorOf(kItalian));
+    std::uint32_t hugeWidth = 100000;
+    std::memcpy(&lying[18], &hugeWidth, 4);  // header claims far more pixels than the file has
+    disc.WriteFile(FindLanguage(kItalian)->backgroundFile, lying);
+    LoadBackgrounds();
+    EXPECT_EQ(launcher.backgroundWidth, 640);
+    EXPECT_NE(BackgroundFor(kUsEnglish), nullptr);
+    for (LanguageBase base : {kFrench, kGerman, kSpanish, kItalian}) {
+        SCOPED_TRACE(base);
+        EXPECT_EQ(BackgroundFor(base), nullptr);
+    }
+}
+
+TEST_F(Painting, ShowsTheActiveLanguagesBackgroundOrTheLanguageList) {
+    WriteAllBackgrounds();
+    LoadCatalogue();
+    Surface surface(640, 480);
+    for (LanguageBase base : {kUsEnglish, kThai, kDanish}) {
+        SCOPED_TRACE(base);
+        launcher.languageBase = base;
+        launcher.languageKnown = true;
+        PaintLauncherWindow(surface.Dc());
+        EXPECT_EQ(surface.At(5, 5), TestColorOf(base));
+        EXPECT_EQ(surface.At(639, 479), TestColorOf(base));
+        EXPECT_FALSE(launcher.buttonsRefreshed);
+    }
+    launcher.languageBase = kNoLanguage;
+    launcher.languageKnown = false;
+    PaintLauncherWindow(surface.Dc());
+    const DibBitmap* list = BackgroundFor(0);
+    if (list) {
+        // The language-selection picture is the program's own: it is not any language's colour.
+        EXPECT_FALSE(surface.At(5, 5) == TestColorOf(kUsEnglish));
+    } else {
+        EXPECT_EQ(surface.At(5, 5), TestColorOf(kUsEnglish)) << "no list picture: the first one shows";
+    }
+}
+
+TEST_F(Painting, MissingLanguageBackgroundShowsTheFirstOneLoaded) {
+    WriteBackground(kFrench);
+    WriteBackground(kGerman);
+    LoadCatalogue();
+    Surface surface(640, 480);
+    launcher.languageBase = kGerman;
+    launcher.languageKnown = true;
+    PaintLauncherWindow(surface.Dc());
+    ASSERT_EQ(surface.At(10, 10), TestColorOf(kGerman));
+    launcher.languageBase = kKorean;  // not on this disc
+    PaintLauncherWindow(surface.Dc());
+    EXPECT_EQ(surface.At(10, 10), TestColorOf(kFrench));
+}
+
+TEST_F(Painting, OpenPanelIsCompositedAtItsPlaceThroughTheOpaqueMask) {
+    WriteAllBackgrounds();
+    LoadCatalogue();
+    // Stand-ins with known colours, whatever the program's own pictures look like.
+    catalogue.opaqueMask.reset(CreateDib(350, 350, 8));
+    std::uint8_t* rows = nullptr;
+    std::uint32_t stride = 0;
+    std::uint16_t depth = 0;
+    ASSERT_TRUE(DibRowInfo(catalogue.opaqueMask.get(), rows, stride, depth));
+    std::memset(rows, 252, stride * 350);
+    catalogue.panelPictures[1].reset(CreateDib(237, 256, 24));
+    ASSERT_TRUE(DibRowInfo(catalogue.panelPictures[1].get(), rows, stride, depth));
+    std::memset(rows, 255, stride * 256);  // white
+
+    launcher.languageBase = kUsEnglish;
+    launcher.languageKnown = true;
+    launcher.menu.panelOpen = true;
+    launcher.openPanel = 1;
+    Surface surface(640, 480);
+    PaintLauncherWindow(surface.Dc());
+    Rgb under = TestColorOf(kUsEnglish);
+    auto blend = [](int a, int b) { return static_cast<std::uint8_t>((a * 252 + b * 3) >> 8); };
+    Rgb expected{blend(255, under.r), blend(255, under.g), blend(255, under.b)};
+    EXPECT_EQ(surface.At(403, 67), expected);
+    EXPECT_EQ(surface.At(639, 322), expected);
+    EXPECT_EQ(surface.At(402, 67), under);
+    EXPECT_EQ(surface.At(403, 66), under);
+    EXPECT_EQ(surface.At(500, 323), under);
+
+    // Closing the panel paints the pristine background again.
+    launcher.menu.panelOpen = false;
+    launcher.openPanel = kNoPanel;
+    PaintLauncherWindow(surface.Dc());
+    EXPECT_EQ(surface.At(500, 100), under);
+}
+
+// The caption pixels (dark blue text on the green test background) in a band of rows.
+struct Ink {
+    int left = 10000, right = -1, count = 0;
+};
+Ink FindInk(const Surface& surface, int top, int bottom, Rgb background) {
+    Ink ink;
+    for (int y = top; y <= bottom; ++y) {
+        for (int x = 0; x < 640; ++x) {
+            Rgb c = surface.At(x, y);
+            if (c == background) continue;
+            // Anti-aliased text lies between the background and the caption colour: its
+            // green falls well below the background's.
+            if (c.g + 60 < background.g) {
+                ink.left = std::min(ink.left, x);
+                ink.right = std::max(ink.right, x);
+                ++ink.count;
+            }
+        }
+    }
+    return ink;
+}
+
+TEST_F(Painting, CaptionsAreRightAlignedAtTheirPoints) {
+    WriteAllBackgrounds();
+    LoadCatalogue();
+    launcher.languageBase = kUsEnglish;
+    launcher.languageKnown = true;
+    Surface surface(640, 480);
+    PaintLauncherWindow(surface.Dc());
+    Rgb background = TestColorOf(kUsEnglish);
+    struct Row {
+        int right, bottom;
+    };
+    for (Row row : {Row{187, 237}, Row{262, 278}, Row{329, 332}, Row{370, 391}, Row{398, 443}}) {
+        SCOPED_TRACE(row.right);
+        Ink ink = FindInk(surface, row.bottom - 14, row.bottom - 2, background);
+        ASSERT_GT(ink.count, 20) << "no caption text there";
+        EXPECT_LE(ink.right, row.right);
+        // Side bearings of the last glyph leave a few pixels free; a left-aligned or misplaced
+        // caption would end far from the point.
+        EXPECT_GE(ink.right, row.right - 12) << "caption does not end at its point";
+    }
+    // Without a settled language there are no captions.
+    launcher.languageKnown = false;
+    launcher.languageBase = kNoLanguage;
+    catalogue.languageBackgrounds[0].reset(CloneDib(BackgroundFor(kUsEnglish)));
+    PaintLauncherWindow(surface.Dc());
+    EXPECT_EQ(FindInk(surface, 223, 235, background).count, 0);
+}
+
+TEST_F(Painting, EditionTwoHasNoMoreGamesCaption) {
+    WriteAllBackgrounds();
+    LoadCatalogue();
+    launcher.languageBase = kUsEnglish;
+    launcher.languageKnown = true;
+    launcher.discSku = 2;
+    Surface surface(640, 480);
+    PaintLauncherWindow(surface.Dc());
+    EXPECT_EQ(FindInk(surface, 318, 330, TestColorOf(kUsEnglish)).count, 0);
+    EXPECT_GT(FindInk(surface, 377, 389, TestColorOf(kUsEnglish)).count, 20);
+}
+
+TEST_F(Painting, NullPictureDrawsThroughPatBlt) {
+    Surface surface(20, 20);
+    SelectObject(surface.Dc(), GetStockObject(BLACK_BRUSH));
+    EXPECT_TRUE(StretchDibBlt(surface.Dc(), 0, 0, 20, 20, nullptr, 0, 0, 20, 20, PATCOPY));
+    EXPECT_EQ(surface.At(10, 10), (Rgb{0, 0, 0}));
+    SelectObject(surface.Dc(), GetStockObject(WHITE_BRUSH));
+    StretchDibBlt(surface.Dc(), 0, 0, 20, 20, nullptr, 0, 0, 20, 20, PATCOPY);
+    EXPECT_EQ(surface.At(10, 10), (Rgb{255, 255, 255}));
+}
+
+}  // namespace
