@@ -39,6 +39,10 @@ case "$command" in
         # CTest's pipes open.
         setsid "$WINESERVER" -p </dev/null >/dev/null 2>&1 || true
         timeout 300 "$WINE" wineboot -i </dev/null >"$STATE/wineboot.log" 2>&1
+        # The launcher names Windows fonts: Wine is told which free fonts stand in for them.
+        # regedit takes names beyond ASCII only from a UTF-16 file.
+        { printf '\377\376'; sed 's/$/\r/' "$(dirname "$0")/fonts.reg" | iconv -f UTF-8 -t UTF-16LE; } >"$STATE/fonts.reg"
+        (cd "$STATE" && timeout 60 "$WINE" regedit /S fonts.reg </dev/null >>"$STATE/wineboot.log" 2>&1)
         timeout 120 "$WINESERVER" -w || true
         setsid "$WINESERVER" -p </dev/null >/dev/null 2>&1 || true
         echo "Wine prefix ready in $WINEPREFIX on display ${DISPLAY}"
