@@ -106,9 +106,9 @@ HWND WaitForWindow(DWORD processId, const wchar_t* className, DWORD timeoutMs) {
     return nullptr;
 }
 
-std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs) {
-    HWND window = WaitForWindow(processId, L"#32770", timeoutMs);
-    if (!window) return std::nullopt;
+namespace {
+
+MessageBoxSeen ReadMessageBox(HWND window) {
     MessageBoxSeen box;
     box.window = window;
     box.caption = TextOf(window);
@@ -116,6 +116,26 @@ std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs
     std::sort(box.buttons.begin(), box.buttons.end());
     return box;
 }
+
+}  // namespace
+
+std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption,
+                                                      DWORD timeoutMs) {
+    DWORD start = GetTickCount();
+    do {
+        HWND window = FindWindowW(L"#32770", caption.c_str());
+        if (window && IsWindowVisible(window)) return ReadMessageBox(window);
+        Sleep(50);
+    } while (GetTickCount() - start < timeoutMs);
+    return std::nullopt;
+}
+
+std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs) {
+    HWND window = WaitForWindow(processId, L"#32770", timeoutMs);
+    if (!window) return std::nullopt;
+    return ReadMessageBox(window);
+}
+
 
 bool PressButton(const MessageBoxSeen& box, int buttonId) {
     HWND button = GetDlgItem(box.window, buttonId);

@@ -42,6 +42,9 @@ struct MessageBoxSeen {
 
 // Waits for a visible message box of process `processId`.
 std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs = kWindowWaitMs);
+// Waits for a visible message box of any process with this caption.
+std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption,
+                                                      DWORD timeoutMs = kWindowWaitMs);
 // Presses one of the box's buttons (IDOK, IDCANCEL, ...) and waits for the box to go.
 bool PressButton(const MessageBoxSeen& box, int buttonId);
 // Visible top-level windows of a process with the given class (null: any class).

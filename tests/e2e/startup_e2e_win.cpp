@@ -79,6 +79,11 @@ TEST_F(LauncherStartup, OffTheDiscWithTheSetupFilesItStartsTheInstallerInUsEngli
     EXPECT_EQ(lines[0][1], L"-l0009");
     EXPECT_TRUE(SameTextIgnoringCase(lines[0][2], disc.Root() + L"Setup"))
         << "the installer ran in another folder";
+    // The installer asks before it installs; the user declines.
+    auto question = WaitForMessageBoxTitled(L"The Vemo Vodizuri Virezazida Setup");
+    ASSERT_TRUE(question) << "the installer did not ask";
+    EXPECT_NE(question->text.find(L"English"), std::wstring::npos);
+    ASSERT_TRUE(PressButton(*question, IDCANCEL));
     EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
     EXPECT_TRUE(TopLevelWindows(launcher.Id(), L"#32770").empty());
 }
