@@ -1,0 +1,20 @@
+#!/usr/bin/env bash
+# Takes the README's screenshots: runs the end-to-end screen tests of a build with the
+# launcher on its sample disc under Wine, and turns the screens they save into PNG files.
+#   screenshots.sh BUILD_DIR [OUT_DIR]
+set -euo pipefail
+build=$(cd "$1" && pwd)
+here=$(cd "$(dirname "$0")/.." && pwd)
+out=${2:-$here/docs/screenshots}
+STATE="$build/screenshots-wine"
+shots="$build/screenshots"
+rm -rf "$shots"
+mkdir -p "$shots" "$out"
+"$here/tests/wine/prefix.sh" setup "$STATE" >/dev/null
+trap '"$here/tests/wine/prefix.sh" cleanup "$STATE" >/dev/null 2>&1 || true' EXIT
+AUTOPLAY_SCREENSHOT_DIR="Z:${shots//\//\\}" "$here/tests/wine/run.sh" "$STATE" \
+    "$build/bin/e2e_tests.exe" --gtest_filter='Screens.*' | grep -E '^\[ *(OK|FAILED|PASSED) '
+for shot in "$shots"/*.bmp; do
+    convert "$shot" -strip "$out/$(basename "${shot%.bmp}").png"
+done
+ls "$out"
