@@ -1,5 +1,6 @@
 # Everything starts here:
-#   make demo   build, then run the launcher under Wine on the sample disc (SKU=1..6)
+#   make demo   build, then run the launcher under Wine on the sample disc
+#               (SKU=1..6 picks the disc's edition, ARGS=-l0411 a language)
 #   make test   build everything and run every test: host, Win32 (Wine) and end to end
 #   make bench  the compositing benchmark, and the time to the first painted frame under Wine
 SHELL := /bin/bash
@@ -44,7 +45,7 @@ test: test-host test-windows
 
 demo: host
 	$(call cross_build,$(WINE_ARCH),)
-	scripts/demo.sh $(BUILD)/$(WINE_ARCH)
+	AUTOPLAY_ARGS="$(ARGS)" scripts/demo.sh $(BUILD)/$(WINE_ARCH)
 
 bench: host
 	$(call cross_build,$(WINE_ARCH),)

@@ -3,6 +3,7 @@
 # there is one (until the launcher is closed), else on Xvfb for a little while; either way
 # it saves a screenshot.
 #   demo.sh BUILD_DIR [SECONDS_ON_XVFB]
+# The launcher's command line comes from AUTOPLAY_ARGS (for example -l0411 for Japanese).
 set -euo pipefail
 build=$(cd "$1" && pwd)
 seconds=${2:-12}
@@ -25,7 +26,7 @@ source "$here/tests/wine/env.sh"
 
 cd "$disc"
 echo "Running $disc/AutoPlay.exe on display $DISPLAY"
-"$WINE" "$disc/AutoPlay.exe" >"$STATE/demo.log" 2>&1 &
+"$WINE" "$disc/AutoPlay.exe" ${AUTOPLAY_ARGS:-} >"$STATE/demo.log" 2>&1 &
 launcher=$!
 sleep 6
 import -display "$DISPLAY" -window root "$shot" 2>/dev/null && echo "Screenshot: $shot"
