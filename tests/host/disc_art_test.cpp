@@ -134,11 +134,11 @@ double Contrast(double a, double b) {
 
 // ---- What the launcher expects of its resources ----
 
-struct BitmapSpec {
+struct ExpectedBitmap {
     int id, width, height, bits;
 };
 
-struct IconSpec {
+struct ExpectedIcon {
     int key, width, height;
     int pictures[4];  // normal, pressed, focused, latched; 0 = none
     int masks[4];
@@ -146,7 +146,7 @@ struct IconSpec {
     int reach = 8;              // how far solid parts may lie outside the hit circle
 };
 
-const IconSpec kIcons[] = {
+const ExpectedIcon kIcons[] = {
     {0, 85, 96, {223, 246, 245, 0}, {269, 265, 266, 0}, 40, 50, 35},
     {1, 85, 96, {237, 238, 239, 362}, {273, 274, 270, 372}, 40, 50, 35},
     {2, 85, 96, {327, 324, 397, 368}, {319, 325, 396, 369}, 40, 50, 35},
@@ -163,12 +163,12 @@ const IconSpec kIcons[] = {
 };
 
 // Plate key, normal (= focused) and pressed ids, and the place whose picture it carries.
-struct PlateSpec {
+struct ExpectedPlate {
     int key, normal, pressed, x, y;
     int panel;  // 376, 227 or 222; 0 for the language list on 377
 };
 
-const PlateSpec kPlates[] = {
+const ExpectedPlate kPlates[] = {
     {0, 408, 409, 416, 29, 222},  {1, 350, 352, 416, 81, 222},   {2, 340, 338, 416, 133, 222},
     {3, 336, 353, 416, 185, 222}, {4, 358, 361, 416, 28, 227},   {5, 348, 346, 416, 81, 227},
     {6, 354, 357, 416, 133, 227}, {7, 344, 355, 416, 185, 227},  {8, 316, 314, 295, 71, 376},
@@ -179,12 +179,12 @@ const PlateSpec kPlates[] = {
     {21, 514, 515, 84, 100, 0},   {22, 516, 517, 300, 100, 0},
 };
 
-struct PanelSpec {
+struct ExpectedPanel {
     int id;
     Rect place;
 };
 
-const PanelSpec kPanels[] = {
+const ExpectedPanel kPanels[] = {
     {376, {271, 55, 240, 149}},
     {227, {403, 67, 237, 256}},
     {222, {403, 54, 237, 252}},
@@ -208,24 +208,24 @@ std::vector<Rect> LayoutRects() {
         {295, 123, 209, 49}, {416, 28, 209, 49}, {416, 81, 209, 49}, {416, 133, 209, 49},
         {416, 185, 209, 49}, {416, 29, 209, 49},
     };
-    for (const PanelSpec& panel : kPanels) rects.push_back(panel.place);
+    for (const ExpectedPanel& panel : kPanels) rects.push_back(panel.place);
     for (const auto& end : kCaptionEnds) rects.push_back({end[0] - 172, end[1] - 20, 172, 20});
     return rects;
 }
 
-std::vector<BitmapSpec> AllBitmaps() {
-    std::vector<BitmapSpec> all = {
+std::vector<ExpectedBitmap> AllBitmaps() {
+    std::vector<ExpectedBitmap> all = {
         {377, 640, 480, 24}, {248, 350, 350, 8},  {376, 240, 149, 24}, {227, 237, 256, 24},
         {222, 237, 252, 24}, {241, 400, 488, 24}, {264, 162, 117, 8},
     };
-    for (const PlateSpec& plate : kPlates) {
+    for (const ExpectedPlate& plate : kPlates) {
         const int w = plate.key <= 10 ? 209 : 212;
         const int h = plate.key <= 10 ? 49 : 50;
         all.push_back({plate.normal, w, h, 24});
         all.push_back({plate.pressed, w, h, 24});
     }
     std::set<int> masks;
-    for (const IconSpec& icon : kIcons) {
+    for (const ExpectedIcon& icon : kIcons) {
         for (int s = 0; s < 4; ++s) {
             if (icon.pictures[s] == 0) continue;
             all.push_back({icon.pictures[s], icon.width, icon.height, 24});
@@ -272,7 +272,7 @@ class DiscArt : public ::testing::Test {
     // The English background with a panel composited over it, as the launcher paints it.
     Bitmap WithPanel(int panelId) {
         Bitmap screen = Background("AutoPlayBack.bmp");
-        for (const PanelSpec& panel : kPanels) {
+        for (const ExpectedPanel& panel : kPanels) {
             if (panel.id == panelId) {
                 Blend(Picture(panel.id), screen, panel.place.x, panel.place.y, Picture(248));
             }
@@ -288,12 +288,12 @@ class DiscArt : public ::testing::Test {
 // ---- Files and formats ----
 
 TEST_F(DiscArt, EveryBitmapHasItsSizeAndDepth) {
-    for (const BitmapSpec& spec : AllBitmaps()) {
-        SCOPED_TRACE("bitmap " + std::to_string(spec.id));
-        const Bitmap& b = Picture(spec.id);
-        EXPECT_EQ(b.width, spec.width);
-        EXPECT_EQ(b.height, spec.height);
-        EXPECT_EQ(b.bits, spec.bits);
+    for (const ExpectedBitmap& want : AllBitmaps()) {
+        SCOPED_TRACE("bitmap " + std::to_string(want.id));
+        const Bitmap& b = Picture(want.id);
+        EXPECT_EQ(b.width, want.width);
+        EXPECT_EQ(b.height, want.height);
+        EXPECT_EQ(b.bits, want.bits);
     }
 }
 
@@ -316,8 +316,8 @@ TEST_F(DiscArt, ResourceScriptListsEveryResourceOnceWithoutLanguage) {
         EXPECT_TRUE(ReadAll(Path(file), listed)) << "listed file is missing: " << file;
     }
     std::set<std::string> expected = {"247 IDR_PALETTE", "113 WAVE", "308 WAVE", "101 ICON"};
-    for (const BitmapSpec& spec : AllBitmaps())
-        expected.insert(std::to_string(spec.id) + " BITMAP");
+    for (const ExpectedBitmap& want : AllBitmaps())
+        expected.insert(std::to_string(want.id) + " BITMAP");
     for (const std::string& key : expected) EXPECT_EQ(entries.count(key), 1u) << key;
     EXPECT_EQ(entries.size(), expected.size());
 }
@@ -366,15 +366,15 @@ TEST_F(DiscArt, PaletteHasTheRiffLayoutAndFixedEntries) {
 }
 
 TEST_F(DiscArt, SoundsAreShortCleanMonoPcm) {
-    struct WaveSpec {
+    struct ExpectedWave {
         const char* file;
         double minSeconds, maxSeconds;
     };
-    for (const WaveSpec& spec :
-         {WaveSpec{"wave_113.wav", 0.02, 0.15}, WaveSpec{"wave_308.wav", 4.0, 7.0}}) {
-        SCOPED_TRACE(spec.file);
+    for (const ExpectedWave& want :
+         {ExpectedWave{"wave_113.wav", 0.02, 0.15}, ExpectedWave{"wave_308.wav", 4.0, 7.0}}) {
+        SCOPED_TRACE(want.file);
         Bytes wav;
-        ASSERT_TRUE(ReadAll(Path(spec.file), wav));
+        ASSERT_TRUE(ReadAll(Path(want.file), wav));
         ASSERT_GE(wav.size(), 44u);
         EXPECT_EQ(std::string(wav.begin(), wav.begin() + 4), "RIFF");
         EXPECT_EQ(U32(wav, 4), wav.size() - 8);
@@ -391,8 +391,8 @@ TEST_F(DiscArt, SoundsAreShortCleanMonoPcm) {
         ASSERT_EQ(44 + dataSize, wav.size());
         const size_t count = dataSize / 2;
         const double seconds = static_cast<double>(count) / 22050.0;
-        EXPECT_GE(seconds, spec.minSeconds);
-        EXPECT_LE(seconds, spec.maxSeconds);
+        EXPECT_GE(seconds, want.minSeconds);
+        EXPECT_LE(seconds, want.maxSeconds);
         int peak = 0;
         for (size_t i = 0; i < count; ++i) {
             const int s = static_cast<int16_t>(U16(wav, 44 + i * 2));
@@ -450,7 +450,7 @@ TEST_F(DiscArt, OpaqueMaskHoldsOnly251And252) {
 }
 
 TEST_F(DiscArt, CircularMasksAreOpaqueInsideAndClearAtTheEdges) {
-    for (const IconSpec& icon : kIcons) {
+    for (const ExpectedIcon& icon : kIcons) {
         for (int s = 0; s < 4; ++s) {
             if (icon.pictures[s] == 0) continue;
             SCOPED_TRACE("key " + std::to_string(icon.key) + " state " + std::to_string(s));
@@ -474,7 +474,7 @@ TEST_F(DiscArt, CircularMasksAreOpaqueInsideAndClearAtTheEdges) {
 }
 
 TEST_F(DiscArt, VisibleButtonMatchesItsHitCircle) {
-    for (const IconSpec& icon : kIcons) {
+    for (const ExpectedIcon& icon : kIcons) {
         SCOPED_TRACE("key " + std::to_string(icon.key));
         const Bitmap& mask = Picture(icon.masks[0]);
         int holes = 0;
@@ -511,7 +511,7 @@ long Coverage(const Bitmap& mask) {
 }
 
 TEST_F(DiscArt, ButtonStatesLookDifferent) {
-    for (const IconSpec& icon : kIcons) {
+    for (const ExpectedIcon& icon : kIcons) {
         SCOPED_TRACE("key " + std::to_string(icon.key));
         const Bitmap& normal = Picture(icon.pictures[0]);
         const Bitmap& normalMask = Picture(icon.masks[0]);
@@ -573,8 +573,8 @@ TEST_F(DiscArt, AboutGreyPictureIsTheEmblemOutline) {
 TEST_F(DiscArt, PlatesMatchWhatLiesUnderTheirPlace) {
     std::map<int, Bitmap> grounds;
     grounds[0] = Picture(377);
-    for (const PanelSpec& panel : kPanels) grounds[panel.id] = WithPanel(panel.id);
-    for (const PlateSpec& plate : kPlates) {
+    for (const ExpectedPanel& panel : kPanels) grounds[panel.id] = WithPanel(panel.id);
+    for (const ExpectedPlate& plate : kPlates) {
         for (int id : {plate.normal, plate.pressed}) {
             SCOPED_TRACE("plate key " + std::to_string(plate.key) + " bitmap " +
                          std::to_string(id));
@@ -597,7 +597,7 @@ TEST_F(DiscArt, PlatesMatchWhatLiesUnderTheirPlace) {
 
 TEST_F(DiscArt, PlatesAreDarkEnoughForTheirLabels) {
     const double labelNormal = Luminance(std::vector<uint8_t>{216, 211, 204}.data());
-    for (const PlateSpec& plate : kPlates) {
+    for (const ExpectedPlate& plate : kPlates) {
         for (int id : {plate.normal, plate.pressed}) {
             SCOPED_TRACE("bitmap " + std::to_string(id));
             const Bitmap& picture = Picture(id);
@@ -617,7 +617,7 @@ TEST_F(DiscArt, PlatesAreDarkEnoughForTheirLabels) {
 
 TEST_F(DiscArt, PanelEdgesBlendIntoTheBackground) {
     const Bitmap& english = Background("AutoPlayBack.bmp");
-    for (const PanelSpec& panel : kPanels) {
+    for (const ExpectedPanel& panel : kPanels) {
         SCOPED_TRACE("panel " + std::to_string(panel.id));
         const Bitmap& picture = Picture(panel.id);
         int worst = 0;
@@ -691,7 +691,7 @@ TEST_F(DiscArt, CaptionAreasAreLightAndCalm) {
 
 TEST_F(DiscArt, LanguageListLeavesItsPlatePlacesCalm) {
     const Bitmap& list = Picture(377);
-    for (const PlateSpec& plate : kPlates) {
+    for (const ExpectedPlate& plate : kPlates) {
         if (plate.panel != 0) continue;
         SCOPED_TRACE("place " + std::to_string(plate.x) + "," + std::to_string(plate.y));
         double minimum = 1.0;

@@ -295,14 +295,14 @@ void PaintCirrus(Canvas& canvas, const SkyLight& light, Box area, uint32_t seed)
         Blend::Screen);
 }
 
-void PaintCloudBank(Canvas& canvas, const SkyLight& light, const CloudBankSpec& spec) {
-    Random random(spec.seed);
+void PaintCloudBank(Canvas& canvas, const SkyLight& light, const CloudBankLayout& layout) {
+    Random random(layout.seed);
     std::vector<Puff> puffs;
-    for (float x = spec.x0; x < spec.x1;) {
-        const float t = (x - spec.x0) / (spec.x1 - spec.x0);
+    for (float x = layout.x0; x < layout.x1;) {
+        const float t = (x - layout.x0) / (layout.x1 - layout.x0);
         const float bell = std::pow(std::sin(kPi * Clamp01(t)), 0.6f);
-        const float r = Lerp(spec.minRadius, spec.maxRadius, bell * random.Range(0.4f, 1.0f));
-        const float cy = spec.base - r * random.Range(0.25f, 0.8f);
+        const float r = Lerp(layout.minRadius, layout.maxRadius, bell * random.Range(0.4f, 1.0f));
+        const float cy = layout.base - r * random.Range(0.25f, 0.8f);
         puffs.push_back({{x, cy}, r});
         if (bell > 0.5f && random.Unit() < 0.55f) {
             puffs.push_back({{x + random.Range(-0.3f, 0.3f) * r, cy - r * 0.75f}, r * 0.72f});
@@ -311,10 +311,10 @@ void PaintCloudBank(Canvas& canvas, const SkyLight& light, const CloudBankSpec& 
     }
     std::stable_sort(puffs.begin(), puffs.end(),
                      [](const Puff& a, const Puff& b) { return a.centre.y < b.centre.y; });
-    float top = spec.base;
+    float top = layout.base;
     for (const Puff& puff : puffs) top = std::min(top, puff.centre.y - puff.radius);
     for (const Puff& puff : puffs) {
-        PaintPuff(canvas, light, puff, spec.haze, top, spec.base, spec.flatBottom);
+        PaintPuff(canvas, light, puff, layout.haze, top, layout.base, layout.flatBottom);
     }
 }
 
@@ -333,26 +333,26 @@ void PaintCloudSea(Canvas& canvas, const SkyLight& light, int firstRow, int last
     float base = light.horizon + 16.0f;
     for (int row = 0; row <= lastRow; ++row) {
         const float k = static_cast<float>(row);
-        CloudBankSpec spec;
-        spec.x0 = -50.0f + 13.0f * static_cast<float>((row * 7) % 5);
-        spec.x1 = static_cast<float>(canvas.width) + 60.0f;
-        spec.base = base;
-        spec.minRadius = 9.0f + 5.0f * k;
-        spec.maxRadius = 18.0f + 9.0f * k;
-        spec.haze = std::max(0.0f, 0.6f - 0.16f * k);
-        spec.flatBottom = false;
-        spec.seed = seed + static_cast<uint32_t>(row) * 7919u;
-        if (row >= firstRow) PaintCloudBank(canvas, light, spec);
+        CloudBankLayout layout;
+        layout.x0 = -50.0f + 13.0f * static_cast<float>((row * 7) % 5);
+        layout.x1 = static_cast<float>(canvas.width) + 60.0f;
+        layout.base = base;
+        layout.minRadius = 9.0f + 5.0f * k;
+        layout.maxRadius = 18.0f + 9.0f * k;
+        layout.haze = std::max(0.0f, 0.6f - 0.16f * k);
+        layout.flatBottom = false;
+        layout.seed = seed + static_cast<uint32_t>(row) * 7919u;
+        if (row >= firstRow) PaintCloudBank(canvas, light, layout);
         base += 24.0f + 4.0f * k;
     }
 }
 
-void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) {
-    Random random(spec.seed);
-    const float cx = spec.top.x;
-    const float ty = spec.top.y;
-    const float hw = spec.halfWidth;
-    const float d = spec.depth;
+void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandLayout& layout) {
+    Random random(layout.seed);
+    const float cx = layout.top.x;
+    const float ty = layout.top.y;
+    const float hw = layout.halfWidth;
+    const float d = layout.depth;
     const float s = hw / 60.0f;
     const Vec2 tip = {cx + hw * 0.12f, ty + d};
     std::vector<Vec2> outline = {{cx - hw, ty}};
@@ -376,10 +376,10 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
                      static_cast<int>(cx + hw) + 5, static_cast<int>(ty + d) + 5};
     const float sunSide = light.sun.x >= cx ? 1.0f : -1.0f;
     auto haze = [&](Rgb color, float x, float y) {
-        return Mix(color, SkyColor(light, x, y), spec.haze);
+        return Mix(color, SkyColor(light, x, y), layout.haze);
     };
 
-    if (spec.waterfall) {
+    if (layout.waterfall) {
         const float wx = cx + hw * 0.48f;
         const float bottom = ty + d * 1.7f;
         const Box fall = {static_cast<int>(wx - 8.0f * s) - 2, static_cast<int>(ty),
@@ -391,7 +391,7 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
                 return std::fabs(x - wx) - 3.2f * s * widen;
             },
             [&](float x, float y) {
-                const float streak = Fbm(x * 0.9f, y * 0.07f - 3.0f, 3, spec.seed + 5);
+                const float streak = Fbm(x * 0.9f, y * 0.07f - 3.0f, 3, layout.seed + 5);
                 const float fade = 1.0f - Smoothstep(bottom - d * 0.6f, bottom, y);
                 const float across = Clamp01(std::fabs(x - wx) / (4.0f * s));
                 const Rgb water = Mix(Mix(Hex(0x8CCBF2), Hex(0xFFFFFF), streak), Hex(0x6FA8E0),
@@ -421,7 +421,7 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
     FillSdf(
         canvas,
         [&](float x, float y) {
-            return SdEllipse({x, y}, spec.top, grassRadii);
+            return SdEllipse({x, y}, layout.top, grassRadii);
         },
         [&](float x, float y) {
             const float t = Clamp01((y - (ty - grassRadii.y)) / (2.0f * grassRadii.y));
@@ -431,7 +431,7 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
         },
         box);
 
-    for (int i = 0; i < spec.trees; ++i) {
+    for (int i = 0; i < layout.trees; ++i) {
         const float x = cx + hw * (i % 2 == 0 ? 0.28f + 0.2f * static_cast<float>(i / 2)
                                               : -0.05f - 0.22f * static_cast<float>(i / 2));
         const float size = s * random.Range(0.8f, 1.15f);
@@ -461,7 +461,7 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
             box);
     }
 
-    if (spec.tower) {
+    if (layout.tower) {
         const float tx = cx - hw * 0.36f;
         const float base = ty + 1.0f;
         const float top = base - 30.0f * s;
@@ -495,7 +495,7 @@ void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec) 
                 return SdRoundBox({x, y}, window, {1.6f * s, 3.0f * s}, 1.5f * s);
             },
             Hex(0xFFD466), box);
-        PaintSparkle(canvas, {tx, top - 16.0f * s}, 6.0f * s, 1.0f - spec.haze, Hex(0xFFE6A0));
+        PaintSparkle(canvas, {tx, top - 16.0f * s}, 6.0f * s, 1.0f - layout.haze, Hex(0xFFE6A0));
     }
 }
 
@@ -569,7 +569,7 @@ Canvas PaintMainScene(const FontLibrary& fonts) {
     PaintCirrus(canvas, light, {0, 120, kWidth, 215}, 31);
     PaintSun(canvas, light, 19.0f);
 
-    IslandSpec far;
+    IslandLayout far;
     far.top = {352.0f, 120.0f};
     far.halfWidth = 20.0f;
     far.depth = 26.0f;
@@ -585,7 +585,7 @@ Canvas PaintMainScene(const FontLibrary& fonts) {
     PaintIsland(canvas, light, far);
     PaintBirds(canvas, {468.0f, 132.0f}, 1.0f, 3);
 
-    CloudBankSpec bank;
+    CloudBankLayout bank;
     bank.x0 = 420.0f;
     bank.x1 = 560.0f;
     bank.base = 88.0f;
@@ -612,7 +612,7 @@ Canvas PaintMainScene(const FontLibrary& fonts) {
     bank.seed = 41;
     PaintCloudBank(canvas, light, bank);
 
-    IslandSpec left;
+    IslandLayout left;
     left.top = {50.0f, 300.0f};
     left.halfWidth = 22.0f;
     left.depth = 30.0f;
@@ -622,7 +622,7 @@ Canvas PaintMainScene(const FontLibrary& fonts) {
     PaintIsland(canvas, light, left);
 
     PaintCloudSea(canvas, light, 0, 3, 97);
-    IslandSpec home;
+    IslandLayout home;
     home.top = {568.0f, 328.0f};
     home.halfWidth = 56.0f;
     home.depth = 82.0f;
@@ -646,7 +646,7 @@ Canvas PaintLanguageListScene(const FontLibrary& fonts) {
     PaintStars(canvas, {0, 0, kWidth, 200}, 130, 77);
     PaintCirrus(canvas, light, {0, 150, kWidth, 300}, 13);
     PaintSun(canvas, light, 17.0f);
-    CloudBankSpec bank;
+    CloudBankLayout bank;
     bank.x0 = 500.0f;
     bank.x1 = 700.0f;
     bank.base = 330.0f;

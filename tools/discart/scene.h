@@ -17,7 +17,7 @@ struct SkyLight {
     float height = 480.0f;   // of the picture the sky fills
 };
 
-struct CloudBankSpec {
+struct CloudBankLayout {
     float x0 = 0.0f;
     float x1 = 0.0f;
     float base = 0.0f;  // y of the flat underside
@@ -28,7 +28,7 @@ struct CloudBankSpec {
     uint32_t seed = 1;
 };
 
-struct IslandSpec {
+struct IslandLayout {
     Vec2 top;  // centre of the grass top
     float halfWidth = 50.0f;
     float depth = 70.0f;
@@ -44,10 +44,10 @@ void PaintSky(Canvas& canvas, const SkyLight& light);
 void PaintStars(Canvas& canvas, Box area, int count, uint32_t seed);
 void PaintSun(Canvas& canvas, const SkyLight& light, float radius);
 void PaintCirrus(Canvas& canvas, const SkyLight& light, Box area, uint32_t seed);
-void PaintCloudBank(Canvas& canvas, const SkyLight& light, const CloudBankSpec& spec);
+void PaintCloudBank(Canvas& canvas, const SkyLight& light, const CloudBankLayout& layout);
 // Rows of clouds from the horizon down to the bottom edge; rows from firstRow on only.
 void PaintCloudSea(Canvas& canvas, const SkyLight& light, int firstRow, int lastRow, uint32_t seed);
-void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandSpec& spec);
+void PaintIsland(Canvas& canvas, const SkyLight& light, const IslandLayout& layout);
 void PaintBirds(Canvas& canvas, Vec2 at, float scale, uint32_t seed);
 
 // The product's word mark: "The Vemo" over "Vodizuri Virezazida"; at is the top-left corner.
