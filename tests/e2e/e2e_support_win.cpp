@@ -149,47 +149,15 @@ bool PressButton(const MessageBoxSeen& box, int buttonId) {
     return true;
 }
 
-DiscFolder::DiscFolder() {
-    wchar_t base[MAX_PATH];
-    GetTempPathW(MAX_PATH, base);
-    static unsigned counter = 0;
-    root_ = std::wstring(base) + L"autoplay-disc-" + std::to_wstring(GetCurrentProcessId()) + L"-" +
-            std::to_wstring(++counter) + L"\\";
-    RemoveTree(root_);
-    CreateDirectoryW(root_.c_str(), nullptr);
-    AddBuiltProgram(L"AutoPlay.exe", L"AutoPlay.exe");
-}
-
-DiscFolder::~DiscFolder() {
-    // Programs started from the disc may still be closing; give them a moment.
-    for (int attempt = 0; attempt < 50; ++attempt) {
-        RemoveTree(root_);
-        if (GetFileAttributesW(root_.c_str()) == INVALID_FILE_ATTRIBUTES) return;
-        Sleep(100);
-    }
-}
+DiscFolder::DiscFolder() { AddBuiltProgram(L"AutoPlay.exe", L"AutoPlay.exe"); }
 
 void DiscFolder::AddFile(const std::wstring& relativePath, const std::string& bytes) const {
-    std::wstring path = root_ + relativePath;
-    for (std::size_t slash = path.find(L'\\', root_.size()); slash != std::wstring::npos;
-         slash = path.find(L'\\', slash + 1)) {
-        CreateDirectoryW(path.substr(0, slash).c_str(), nullptr);
-    }
-    HANDLE file = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
-                              FILE_ATTRIBUTE_NORMAL, nullptr);
-    ASSERT_NE(file, INVALID_HANDLE_VALUE);
-    DWORD written = 0;
-    WriteFile(file, bytes.data(), static_cast<DWORD>(bytes.size()), &written, nullptr);
-    CloseHandle(file);
+    folder_.WriteFile(relativePath, bytes);
 }
 
 void DiscFolder::AddBuiltProgram(const std::wstring& builtName,
                                  const std::wstring& relativePath) const {
-    std::wstring target = root_ + relativePath;
-    for (std::size_t slash = target.find(L'\\', root_.size()); slash != std::wstring::npos;
-         slash = target.find(L'\\', slash + 1)) {
-        CreateDirectoryW(target.substr(0, slash).c_str(), nullptr);
-    }
+    std::wstring target = folder_.MakeFoldersFor(relativePath);
     ASSERT_TRUE(CopyFileW((TestProgramFolder() + builtName).c_str(), target.c_str(), FALSE))
         << "missing built program";
 }

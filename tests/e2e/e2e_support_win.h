@@ -10,6 +10,8 @@
 #include <string>
 #include <vector>
 
+#include "test_support_win.h"
+
 constexpr DWORD kWindowWaitMs = 20000;
 
 // A program started for a test; killed when the test ends if still running.
@@ -56,12 +58,9 @@ HWND WaitForWindow(DWORD processId, const wchar_t* className, DWORD timeoutMs = 
 class DiscFolder {
 public:
     DiscFolder();
-    ~DiscFolder();
-    DiscFolder(const DiscFolder&) = delete;
-    DiscFolder& operator=(const DiscFolder&) = delete;
 
-    const std::wstring& Root() const { return root_; }
-    std::wstring Launcher() const { return root_ + L"AutoPlay.exe"; }
+    const std::wstring& Root() const { return folder_.Path(); }
+    std::wstring Launcher() const { return Root() + L"AutoPlay.exe"; }
     void AddFile(const std::wstring& relativePath, const std::string& bytes) const;
     // Copies a program built beside the tests (e.g. setup.exe) into the disc.
     void AddBuiltProgram(const std::wstring& builtName, const std::wstring& relativePath) const;
@@ -69,7 +68,7 @@ public:
     void AddDiscOneFiles() const;
 
 private:
-    std::wstring root_;
+    TempFolder folder_;
 };
 
 // The companion programs' log for one test (set in this process's environment, so every

@@ -66,14 +66,25 @@ TempFolder::TempFolder() {
     }
 }
 
-TempFolder::~TempFolder() { RemoveTree(path_); }
+TempFolder::~TempFolder() {
+    for (int attempt = 0; attempt < 50; ++attempt) {
+        RemoveTree(path_);
+        if (GetFileAttributesW(path_.c_str()) == INVALID_FILE_ATTRIBUTES) return;
+        Sleep(100);
+    }
+}
 
-std::wstring TempFolder::WriteFile(const std::wstring& relativePath, const std::string& bytes) const {
+std::wstring TempFolder::MakeFoldersFor(const std::wstring& relativePath) const {
     std::wstring path = path_ + relativePath;
     for (std::size_t slash = path.find(L'\\', path_.size()); slash != std::wstring::npos;
          slash = path.find(L'\\', slash + 1)) {
         CreateDirectoryW(path.substr(0, slash).c_str(), nullptr);
     }
+    return path;
+}
+
+std::wstring TempFolder::WriteFile(const std::wstring& relativePath, const std::string& bytes) const {
+    std::wstring path = MakeFoldersFor(relativePath);
     HANDLE file = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
                               FILE_ATTRIBUTE_NORMAL, nullptr);
     EXPECT_NE(file, INVALID_HANDLE_VALUE);

@@ -35,7 +35,8 @@ private:
     HKEY key_ = nullptr;
 };
 
-// A new empty folder under %TEMP%, removed with its contents when the test ends.
+// A new empty folder under %TEMP%, removed with its contents when the test ends (programs
+// started from it get a few seconds to close first).
 class TempFolder {
 public:
     TempFolder();
@@ -47,6 +48,8 @@ public:
     const std::wstring& Path() const { return path_; }
     // Writes a file below the folder (making sub-folders as needed) and returns its path.
     std::wstring WriteFile(const std::wstring& relativePath, const std::string& bytes) const;
+    // Makes the sub-folders a file below the folder needs and returns the file's path.
+    std::wstring MakeFoldersFor(const std::wstring& relativePath) const;
 
 private:
     std::wstring path_;
