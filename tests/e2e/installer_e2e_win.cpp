@@ -8,6 +8,7 @@
 #include "e2e_support_win.h"
 #include "locale/config_win.h"
 #include "sample_disc_win.h"
+#include "shell/launcher_state.h"
 #include "test_support_win.h"
 
 namespace {
@@ -147,8 +148,16 @@ TEST_F(Installer, SilentInstallLeavesWhatTheLauncherReadsAndUninstallTakesItAway
         EXPECT_EQ(FileSize(GameFolder() + L"\\..\\The Vemo Creator\\TheVemoCreator.exe"),
                   FileSize(disc.Path(L"Setup\\Program\\TheVemoCreator.exe")));
 
+        // The launcher's own installation check finds the game it would offer to play.
+        launcher.menu.installed = false;
+        launcher.menu.CheckInstallation();
+        EXPECT_TRUE(launcher.menu.installed);
+        EXPECT_EQ(launcher.menu.installPath, GameFolder());
+
         ASSERT_EQ(RunSetup(L"-u -s"), std::optional<DWORD>(0));
         ExpectNothingInstalled();
+        launcher.menu.CheckInstallation();
+        EXPECT_FALSE(launcher.menu.installed);
     }
 
     auto lines = log.Lines();
