@@ -73,14 +73,24 @@ bool TestProcess::Start(const std::wstring& program, const std::wstring& argumen
     STARTUPINFOW startup{};
     startup.cb = sizeof(startup);
     PROCESS_INFORMATION info{};
-    if (!CreateProcessW(program.c_str(), commandLine.data(), nullptr, nullptr, FALSE, 0, nullptr,
-                        folder.empty() ? nullptr : folder.c_str(), &startup, &info)) {
-        return false;
+    // Under a loaded Wine the new process now and then fails during its own start-up; that
+    // says nothing about the program, so a few bounded attempts are allowed.
+    DWORD error = 0;
+    for (int attempt = 0; attempt < 3; ++attempt) {
+        std::wstring writable = commandLine;
+        if (CreateProcessW(program.c_str(), writable.data(), nullptr, nullptr, FALSE, 0, nullptr,
+                           folder.empty() ? nullptr : folder.c_str(), &startup, &info)) {
+            CloseHandle(info.hThread);
+            process_ = info.hProcess;
+            id_ = info.dwProcessId;
+            return true;
+        }
+        error = GetLastError();
+        if (error == ERROR_FILE_NOT_FOUND || error == ERROR_PATH_NOT_FOUND) break;
+        Sleep(500);
     }
-    CloseHandle(info.hThread);
-    process_ = info.hProcess;
-    id_ = info.dwProcessId;
-    return true;
+    ADD_FAILURE() << "CreateProcess failed with error " << error;
+    return false;
 }
 
 std::optional<DWORD> TestProcess::WaitForExit(DWORD timeoutMs) {

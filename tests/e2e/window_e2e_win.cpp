@@ -28,7 +28,7 @@ protected:
     }
 
     HWND Start(const std::wstring& arguments = L"") {
-        EXPECT_TRUE(launcher.Start(disc.Launcher(), arguments, disc.Root()));
+        if (!launcher.Start(disc.Launcher(), arguments, disc.Root())) return nullptr;
         HWND window = WaitForWindow(launcher.Id(), L"LauncherAppClass");
         EXPECT_TRUE(window) << "the launcher showed no window";
         if (window) WaitForPaint(window);
