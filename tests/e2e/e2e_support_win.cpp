@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cstdio>
 
 #include "test_support_win.h"
 
@@ -87,6 +88,7 @@ bool TestProcess::Start(const std::wstring& program, const std::wstring& argumen
         }
         error = GetLastError();
         if (error == ERROR_FILE_NOT_FOUND || error == ERROR_PATH_NOT_FOUND) break;
+        std::fprintf(stderr, "CreateProcess failed with error %lu; trying again\n", error);
         Sleep(500);
     }
     ADD_FAILURE() << "CreateProcess failed with error " << error;
