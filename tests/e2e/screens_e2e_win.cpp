@@ -78,15 +78,7 @@ public:
     }
 
 private:
-    BITMAPINFO Info() const {
-        BITMAPINFO info{};
-        info.bmiHeader.biSize = sizeof(info.bmiHeader);
-        info.bmiHeader.biWidth = width_;
-        info.bmiHeader.biHeight = -height_;
-        info.bmiHeader.biPlanes = 1;
-        info.bmiHeader.biBitCount = 32;
-        return info;
-    }
+    BITMAPINFO Info() const { return TopDownInfo(width_, height_); }
 
     int width_ = 0;
     int height_ = 0;

@@ -179,3 +179,13 @@ Rgb ScreenPixel(int x, int y) {
     ReleaseDC(nullptr, screen);
     return {GetRValue(color), GetGValue(color), GetBValue(color)};
 }
+
+BITMAPINFO TopDownInfo(int width, int height) {
+    BITMAPINFO info{};
+    info.bmiHeader.biSize = sizeof(info.bmiHeader);
+    info.bmiHeader.biWidth = width;
+    info.bmiHeader.biHeight = -height;
+    info.bmiHeader.biPlanes = 1;
+    info.bmiHeader.biBitCount = 32;
+    return info;
+}

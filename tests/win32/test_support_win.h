@@ -74,6 +74,8 @@ std::string SolidBmpFile(int width, int height, Rgb color);
 Rgb TestColorOf(LanguageBase base);
 // The pixel at a point of the screen, as the user sees it.
 Rgb ScreenPixel(int x, int y);
+// The header of a 32-bit top-down picture, the layout tests read pixels in.
+BITMAPINFO TopDownInfo(int width, int height);
 
 // Wine behaves differently from Windows in a few documented details.
 bool RunningOnWine();
