@@ -20,3 +20,45 @@ std::wstring FirstDiscFile(std::wstring_view rootPath) {
 std::wstring SecondDiscFile(std::wstring_view rootPath) {
     return std::wstring(rootPath) + L"Setup\\data2.cab";
 }
+
+std::wstring CreatorFolder(std::wstring_view installPath) {
+    return std::wstring(installPath) + L"\\..\\The Vemo Creator";
+}
+
+bool EditionHasSupportTool(std::uint32_t discSku) { return discSku == 1 || discSku == 3; }
+
+ShellTarget SupportTarget(std::wstring_view rootPath, std::uint32_t discSku, LanguageBase base) {
+    const std::wstring root(rootPath);
+    if (EditionHasSupportTool(discSku)) return {root + L"Support", L"Trivex.exe"};
+    if (base == kFrench) return {root + L"support\\ix help\\fr-fr", L"IX_Help_Fr.htm"};
+    return {root + L"support\\ix help", L"IX_Help_Select.htm"};
+}
+
+ShellTarget RegistrationTarget(std::wstring_view rootPath) {
+    return {std::wstring(rootPath) + L"Support\\", L"Kelpa.exe"};
+}
+
+ShellTarget DemoTarget(std::wstring_view rootPath, std::uint32_t id) {
+    const wchar_t* file = L"";
+    switch (id) {
+        case 601:
+            file = L"vemo2.mpg";
+            break;
+        case 602:
+            file = L"vemo2duskaro.mpg";
+            break;
+        case 603:
+            file = L"vemo2lorrel.mpg";
+            break;
+        case 604:
+            file = L"vemo2console.mpg";
+            break;
+        default:
+            break;
+    }
+    return {std::wstring(rootPath) + L"Demos", file};
+}
+
+std::wstring ReadmePath(std::wstring_view rootPath, LanguageBase base) {
+    return std::wstring(rootPath) + ReadmeFileFor(base);
+}

@@ -2,6 +2,7 @@
 #ifndef AUTOPLAY_ACTIONS_COMMAND_LINES_H
 #define AUTOPLAY_ACTIONS_COMMAND_LINES_H
 
+#include <cstdint>
 #include <string>
 #include <string_view>
 
@@ -16,5 +17,32 @@ std::wstring SetupFolder(std::wstring_view rootPath);
 // The two files that prove Disc 1 is in the drive.
 std::wstring FirstDiscFile(std::wstring_view rootPath);
 std::wstring SecondDiscFile(std::wstring_view rootPath);
+
+// A program or document to open, and the folder to open it in.
+struct ShellTarget {
+    std::wstring folder;
+    std::wstring file;
+};
+
+// The game, its high-resolution argument and the creator tool beside the game's folder.
+inline constexpr wchar_t kGameProgram[] = L"Vemo.exe";
+inline constexpr wchar_t kHighResolutionParameters[] = L"-r1024x768";
+inline constexpr wchar_t kCreatorProgram[] = L"TheVemoCreator.exe";
+std::wstring CreatorFolder(std::wstring_view installPath);
+
+// The support-information tool on editions that carry it (1 and 3); the help page (French,
+// or the general one) on every other edition.
+bool EditionHasSupportTool(std::uint32_t discSku);
+ShellTarget SupportTarget(std::wstring_view rootPath, std::uint32_t discSku, LanguageBase base);
+// The electronic registration program.
+ShellTarget RegistrationTarget(std::wstring_view rootPath);
+
+// The demo video of a demo command, in the disc's Demos folder; an empty file for other ids.
+ShellTarget DemoTarget(std::wstring_view rootPath, std::uint32_t id);
+// The demo commands, in the order of their ids (the last one no button carries).
+inline constexpr std::uint32_t kDemoCommands[] = {601, 602, 603, 604};
+
+// The language's readme on the disc.
+std::wstring ReadmePath(std::wstring_view rootPath, LanguageBase base);
 
 #endif

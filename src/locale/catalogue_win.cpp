@@ -49,42 +49,6 @@ constexpr std::pair<LanguageBase, FontSlot> kLanguageFonts[] = {
     {kFinnish, FontSlot::Western},         {kNorwegian, FontSlot::Western},
 };
 
-// Plate resources by key, for the normal, pressed and focused states.
-constexpr WORD kPlateResources[23][kPlateStates] = {
-    {408, 409, 408}, {350, 352, 350}, {340, 338, 340}, {336, 353, 336}, {358, 361, 358},
-    {348, 346, 348}, {354, 357, 354}, {344, 355, 344}, {316, 314, 316}, {406, 404, 406},
-    {312, 317, 312}, {286, 287, 286}, {290, 291, 290}, {294, 295, 294}, {298, 299, 298},
-    {302, 303, 302}, {306, 307, 306}, {502, 503, 502}, {506, 507, 506}, {510, 511, 510},
-    {512, 513, 512}, {514, 515, 514}, {516, 517, 516},
-};
-
-struct IconResources {
-    WORD picture[kIconStates];  // 0: the button has no such state
-    WORD mask[kIconStates];
-};
-
-// Circular button resources by key 0-11 (key 12 holds copies of key 11).
-constexpr IconResources kIconResources[12] = {
-    {{223, 246, 245, 0}, {269, 265, 266, 0}},
-    {{237, 238, 239, 362}, {273, 274, 270, 372}},
-    {{327, 324, 397, 368}, {319, 325, 396, 369}},
-    {{395, 240, 236, 367}, {272, 275, 271, 375}},
-    {{320, 326, 390, 370}, {321, 318, 389, 371}},
-    {{322, 391, 393, 374}, {323, 392, 394, 373}},
-    {{333, 330, 332, 0}, {329, 331, 328, 0}},
-    {{218, 219, 220, 366}, {255, 256, 257, 363}},
-    {{384, 385, 387, 0}, {388, 386, 383, 0}},
-    {{224, 225, 226, 364}, {261, 262, 259, 365}},
-    {{221, 217, 228, 0}, {254, 263, 260, 0}},
-    {{380, 379, 378, 0}, {267, 268, 267, 0}},
-};
-constexpr std::int32_t kIconLoadOrder[] = {0, 1, 2, 3, 4, 5, 6, 7, 8, 10, 9, 11};
-constexpr std::int32_t kAboutIcon = 11;
-constexpr std::int32_t kListAboutIcon = 12;
-
-constexpr WORD kOpaqueMaskResource = 248;
-constexpr WORD kPanelResources[3] = {376, 227, 222};
-constexpr WORD kLanguageListBackground = 377;
 // Only the panel plates (keys 0-7) are drawn with the palette's colours.
 constexpr std::int32_t kPalettedPlates = 8;
 
@@ -139,7 +103,7 @@ DibBitmap* BackgroundFor(std::int32_t key) { return FindIn(catalogue.languageBac
 
 bool LoadBackgrounds() {
     PictureTable& backgrounds = catalogue.languageBackgrounds;
-    backgrounds[0].reset(LoadPictureResource(kLanguageListBackground, kLoadResourcePicture));
+    backgrounds[0].reset(LoadPictureResource(kLanguageListBackgroundId, kLoadResourcePicture));
     for (const LanguageInfo& language : Languages()) {
         std::wstring path = std::wstring(launcher.rootPath) + language.backgroundFile;
         backgrounds[static_cast<std::int32_t>(language.base)].reset(
@@ -180,16 +144,16 @@ void LoadCatalogue() {
     CreateFonts();
     LoadBackgrounds();
 
-    for (std::int32_t key = 0; key < static_cast<std::int32_t>(std::size(kPlateResources)); ++key) {
+    for (std::int32_t key = 0; key < kPlateKeys; ++key) {
         for (int state = 0; state < kPlateStates; ++state) {
             catalogue.buttonPlates[state][key].reset(
                 LoadPictureResource(kPlateResources[key][state], kLoadResourcePicture));
         }
     }
-    catalogue.opaqueMask.reset(LoadPictureResource(kOpaqueMaskResource, kLoadResourcePicture));
+    catalogue.opaqueMask.reset(LoadPictureResource(kOpaqueMaskId, kLoadResourcePicture));
     for (int panel : {1, 2, 0}) {
         catalogue.panelPictures[panel].reset(
-            LoadPictureResource(kPanelResources[panel], kLoadResourcePicture));
+            LoadPictureResource(kPanelResources[panel].id, kLoadResourcePicture));
     }
     for (std::int32_t key : kIconLoadOrder) {
         const IconResources& resources = kIconResources[key];
@@ -206,11 +170,11 @@ void LoadCatalogue() {
     }
     // The language list's About button gets pictures of its own, so no picture has two owners.
     for (int state = 0; state < kPlateStates; ++state) {
-        catalogue.iconPictures[state][kListAboutIcon].reset(
-            CloneDib(IconPictureFor(state, kAboutIcon)));
+        catalogue.iconPictures[state][kListAboutIconKey].reset(
+            CloneDib(IconPictureFor(state, kAboutIconKey)));
     }
     for (int state = 0; state < kPlateStates; ++state) {
-        catalogue.iconMasks[state][kListAboutIcon].reset(CloneDib(IconMaskFor(state, kAboutIcon)));
+        catalogue.iconMasks[state][kListAboutIconKey].reset(CloneDib(IconMaskFor(state, kAboutIconKey)));
     }
     for (std::int32_t key = 0; key < kPalettedPlates; ++key) {
         for (int state = 0; state < kPlateStates; ++state) {

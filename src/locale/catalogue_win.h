@@ -11,9 +11,8 @@
 
 #include "graphics/dib.h"
 #include "locale/language_table.h"
+#include "locale/picture_ids.h"
 
-constexpr int kPlateStates = 3;  // normal, pressed, focused: plates have no latched face
-constexpr int kIconStates = 4;   // normal, pressed, focused, latched
 constexpr int kFontSlots = 8;
 
 using PictureTable = std::map<std::int32_t, DibPtr>;

@@ -6,48 +6,7 @@
 #include <cstdint>
 
 #include "locale/language_table.h"
-
-// String offsets, the same in every language's set.
-enum StringOffset : std::uint32_t {
-    kStrInstall = 1,
-    kStrPlay = 2,
-    kStrMoreGames = 3,
-    kStrVisitWebSite = 7,
-    kStrMoreInformation = 8,
-    kStrExit = 10,
-    kStrReadme = 12,
-    kStrSupportTool = 13,
-    kStrUninstall = 14,
-    kStrReinstallCaption = 15,
-    kStrReplaceCdText = 17,
-    kStrReplaceCdCaption = 18,
-    kStrRemovableText = 19,
-    kStrRemovableCaption = 20,
-    kStrNoDriveText = 21,
-    kStrNoDriveCaption = 22,
-    kStrDemoCaption = 23,
-    kStrDemoMissingFormat = 24,
-    kStrDemoNoAssociationFormat = 25,
-    kStrNotOnDiscText = 27,
-    kStrNoBrowserCaption = 28,
-    kStrNoBrowserText = 29,
-    kStrBrowserFailedCaption = 30,
-    kStrBrowserFailedText = 31,
-    kStrRegistration = 32,
-    kStrPlay800 = 69,
-    kStrPlay1024 = 70,
-    kStrCreator = 71,
-    kStrDemoPc = 72,
-    kStrLanguageName = 73,
-    kStrDemoLorrel = 77,
-    kStrDemoDuskaro = 78,
-    kStrDemoConsole = 79,
-    kStrReinstallText = 80,
-    kStrInsertDiscCaption = 84,
-    kStrInsertDiscText = 85,
-    kStrGameMissingText = 98,
-    kStrGameMissingCaption = 99,
-};
+#include "locale/string_offsets.h"
 
 // Loads string `base` + `offset` into `buffer`; an id without a string gives an empty text.
 // Returns the length loaded. The text is cut to fit and always terminated.

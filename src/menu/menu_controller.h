@@ -8,13 +8,8 @@
 #include <cstdint>
 #include <string>
 
-enum MenuPage : std::int32_t {
-    MainPage = 0,
-    InfoPanel = 1,
-    LanguagePage = 2,
-    GamesPanel = 3,
-    PlayPanel = 4,
-};
+#include "menu/screen_layout.h"
+
 
 class MenuController {
 public:

@@ -12,7 +12,6 @@
 #include "platform/handles_win.h"
 #include "shell/root_path.h"
 
-constexpr std::uint32_t kNoPanel = 3;
 constexpr std::size_t kCaptionCapacity = 64;
 constexpr std::size_t kMessageCapacity = 256;
 
