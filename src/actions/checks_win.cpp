@@ -92,7 +92,9 @@ void MenuController::CheckInstallation() {
     bool found = ReadGameFolder(markerSeen, folder);
     if (found) {
         installPath = folder;
-        found = FileOpensForReading((folder + L"\\Vemo.exe").c_str());
+        // A folder too long to name the game's program in counts as no game.
+        const std::optional<std::wstring> program = GameProgramPath(folder);
+        found = program && FileOpensForReading(program->c_str());
     }
     installed = found;
     ShowInstallOrPlay();

@@ -25,6 +25,13 @@ std::wstring CreatorFolder(std::wstring_view installPath) {
     return std::wstring(installPath) + L"\\..\\The Vemo Creator";
 }
 
+std::optional<std::wstring> GameProgramPath(std::wstring_view installPath) {
+    constexpr std::size_t kPathCapacity = 260;
+    std::wstring path = std::wstring(installPath) + L"\\" + kGameProgram;
+    if (path.size() + 1 > kPathCapacity) return std::nullopt;
+    return path;
+}
+
 bool EditionHasSupportTool(std::uint32_t discSku) { return discSku == 1 || discSku == 3; }
 
 ShellTarget SupportTarget(std::wstring_view rootPath, std::uint32_t discSku, LanguageBase base) {
@@ -61,4 +68,30 @@ ShellTarget DemoTarget(std::wstring_view rootPath, std::uint32_t id) {
 
 std::wstring ReadmePath(std::wstring_view rootPath, LanguageBase base) {
     return std::wstring(rootPath) + ReadmeFileFor(base);
+}
+
+std::wstring NotepadCommandLine(std::wstring_view readmePath) {
+    return L"notepad.exe \"" + std::wstring(readmePath) + L"\"";
+}
+
+std::wstring FillPlaceholder(std::wstring_view format, std::wstring_view argument) {
+    std::wstring text;
+    bool filled = false;
+    for (std::size_t i = 0; i < format.size(); ++i) {
+        if (format[i] == L'%' && i + 1 < format.size()) {
+            if (format[i + 1] == L'%') {
+                text += L'%';
+                ++i;
+                continue;
+            }
+            if (format[i + 1] == L's' && !filled) {
+                text += argument;
+                filled = true;
+                ++i;
+                continue;
+            }
+        }
+        text += format[i];
+    }
+    return text;
 }

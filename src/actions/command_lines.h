@@ -3,6 +3,7 @@
 #define AUTOPLAY_ACTIONS_COMMAND_LINES_H
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -29,6 +30,9 @@ inline constexpr wchar_t kGameProgram[] = L"Vemo.exe";
 inline constexpr wchar_t kHighResolutionParameters[] = L"-r1024x768";
 inline constexpr wchar_t kCreatorProgram[] = L"TheVemoCreator.exe";
 std::wstring CreatorFolder(std::wstring_view installPath);
+// The game's program in its folder, when that path fits the 260 characters Windows opens
+// files by.
+std::optional<std::wstring> GameProgramPath(std::wstring_view installPath);
 
 // The support-information tool on editions that carry it (1 and 3); the help page (French,
 // or the general one) on every other edition.
@@ -42,7 +46,14 @@ ShellTarget DemoTarget(std::wstring_view rootPath, std::uint32_t id);
 // The demo commands, in the order of their ids (the last one no button carries).
 inline constexpr std::uint32_t kDemoCommands[] = {601, 602, 603, 604};
 
-// The language's readme on the disc.
+// The language's readme on the disc, and Notepad's command line for it: the path is quoted, so
+// a disc folder with spaces in its name still opens the right file.
 std::wstring ReadmePath(std::wstring_view rootPath, LanguageBase base);
+std::wstring NotepadCommandLine(std::wstring_view readmePath);
+
+// A message with one "%s" (as the string sets write it) with `argument` in its place; "%%"
+// stands for "%". Nothing else in the text is read as a format, so a stray "%" in a
+// translation shows as written.
+std::wstring FillPlaceholder(std::wstring_view format, std::wstring_view argument);
 
 #endif

@@ -11,13 +11,6 @@ namespace {
 
 constexpr std::size_t kCaptionTextCapacity = 256;
 
-// The pristine background to show, falling back to the one the working copy was made from
-// when the wanted one is missing.
-const DibBitmap* BackgroundToShow(std::int32_t key) {
-    if (const DibBitmap* wanted = BackgroundFor(key)) return wanted;
-    return BackgroundFor(catalogue.firstBackgroundKey);
-}
-
 void PrepareTextDc(HDC dc, HFONT font) {
     SetTextColor(dc, kCaptionColor);
     SetBkMode(dc, TRANSPARENT);
@@ -27,13 +20,18 @@ void PrepareTextDc(HDC dc, HFONT font) {
 
 }  // namespace
 
+const DibBitmap* ShownBackground() {
+    std::int32_t key = launcher.languageKnown ? static_cast<std::int32_t>(launcher.languageBase) : 0;
+    if (const DibBitmap* wanted = BackgroundFor(key)) return wanted;
+    return BackgroundFor(catalogue.firstBackgroundKey);
+}
+
 void PaintLauncherWindow(HDC dc) {
     PaletteGuard palette(dc, launcher.palette.Get());
     launcher.backgroundBitmap.Reset();
     DibBitmap* working = launcher.workingBackground.get();
 
-    std::int32_t key = launcher.languageKnown ? static_cast<std::int32_t>(launcher.languageBase) : 0;
-    CopyDibPixels(working, BackgroundToShow(key));
+    CopyDibPixels(working, ShownBackground());
     if (launcher.menu.panelOpen) {
         // A panel the menu does not know shows the plain background.
         if (auto place = PanelPlacementFor(launcher.openPanel)) {

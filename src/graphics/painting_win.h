@@ -7,8 +7,13 @@
 
 #include <cstdint>
 
+#include "graphics/dib.h"
+
 // Draws the whole client area into `dc` (a paint DC, or any DC a test reads back).
 void PaintLauncherWindow(HDC dc);
+// The pristine background the window shows: the active language's (the language list's until a
+// language is settled), or the one the working copy was made from when that one is missing.
+const DibBitmap* ShownBackground();
 // Writes a caption of the active language right-aligned to (right, bottom).
 void DrawCaption(HDC dc, std::uint32_t stringOffset, int right, int bottom);
 

@@ -25,6 +25,8 @@ bool TestEnglishProduct();   // disc edition 2 with an English product: offer th
 void ApplyLanguageOption(const wchar_t* commandLine);
 void LanguageFromLangId(LANGID langId);
 bool UninstallEntryExists();
+// Removes the installed product's uninstall entry, so its installer runs as a fresh install.
+void DeleteUninstallEntry();
 void WriteLocale();
 
 // The start-up order of the readers above, including the command-line option.

@@ -15,9 +15,14 @@ int LoadLocalString(LanguageBase base, std::uint32_t offset, wchar_t* buffer,
     return length > 0 ? length : 0;
 }
 
-int ShowLauncherMessage(std::uint32_t captionOffset, std::uint32_t textOffset, unsigned flags) {
+int ShowLauncherMessage(std::uint32_t captionOffset, std::uint32_t textOffset, unsigned flags,
+                        HWND owner) {
     LoadLocalString(launcher.languageBase, textOffset, launcher.messageText, kMessageCapacity);
     LoadLocalString(launcher.languageBase, captionOffset, launcher.messageCaption,
                     kCaptionCapacity);
-    return MessageBoxW(nullptr, launcher.messageText, launcher.messageCaption, flags);
+    return ShowMessageBuffers(flags, owner);
+}
+
+int ShowMessageBuffers(unsigned flags, HWND owner) {
+    return MessageBoxW(owner, launcher.messageText, launcher.messageCaption, flags);
 }

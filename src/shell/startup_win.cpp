@@ -11,6 +11,7 @@
 #include "platform/handles_win.h"
 #include "platform/text_win.h"
 #include "shell/launcher_state.h"
+#include "shell/mouse_hook_win.h"
 #include "shell/root_path.h"
 #include "shell/window_win.h"
 
@@ -73,16 +74,20 @@ void ReportNotOnDisc() {
 
 int RunMessageLoop() {
     MSG message{};
-    while (GetMessageW(&message, nullptr, 0, 0) > 0) {
+    for (;;) {
+        BOOL result = GetMessageW(&message, nullptr, 0, 0);
+        // -1: the loop itself failed; there is no quit message to take a code from.
+        if (result == -1) return 0;
+        if (result == 0) return static_cast<int>(message.wParam);
         TranslateMessage(&message);
         DispatchMessageW(&message);
     }
-    return static_cast<int>(message.wParam);
 }
 
-void ShutDown(UniqueHandle& mutex) {
+void ShutDown(UniqueHandle& mutex, HINSTANCE instance) {
     launcher.menu.DestroyAllButtons();
     ReleaseCatalogue();
+    SetMouseHook(instance, launcher.mainWindow, false);
     if (launcher.mainWindow) DestroyWindow(launcher.mainWindow);
     ReleaseMutex(mutex.Get());
     mutex.Reset();
@@ -128,7 +133,7 @@ int RunLauncher(HINSTANCE instance, HINSTANCE previous, const wchar_t* commandLi
 
     if (launcher.backgroundWidth == 0) {
         ReportNotOnDisc();
-        ShutDown(mutex);
+        ShutDown(mutex, instance);
         return 0;
     }
 
@@ -145,8 +150,9 @@ int RunLauncher(HINSTANCE instance, HINSTANCE previous, const wchar_t* commandLi
         launcher.menu.StartLanguageList(launcher.mainWindow);
     }
     ShowWindow(launcher.mainWindow, SW_SHOWNORMAL);
+    SetMouseHook(instance, launcher.mainWindow, true);
 
     int exitCode = RunMessageLoop();
-    ShutDown(mutex);
+    ShutDown(mutex, instance);
     return exitCode;
 }

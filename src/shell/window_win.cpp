@@ -1,8 +1,29 @@
 #include "shell/window_win.h"
 
+#include "actions/command_ids.h"
+#include "actions/commands_win.h"
 #include "graphics/painting_win.h"
+#include "shell/about_box_win.h"
 #include "platform/handles_win.h"
 #include "shell/launcher_state.h"
+
+namespace {
+
+void DrawLauncherButton(std::uint32_t id, const DRAWITEMSTRUCT& item) {
+    // A paint of the window restored the pristine background under every button, so after each
+    // paint every button draws itself again, once and completely.
+    if (!launcher.buttonsRefreshed) {
+        launcher.buttonsRefreshed = true;
+        for (const std::unique_ptr<LauncherButton>& button : launcher.menu.allButtons) {
+            if (!button->latched) button->lastState = kNotDrawn;
+            InvalidateRect(button->window, nullptr, TRUE);
+        }
+    }
+    PaletteGuard palette(item.hDC, launcher.palette.Get());
+    launcher.menu.DrawButton(item.hDC, id, item.itemState);
+}
+
+}  // namespace
 
 LRESULT CALLBACK MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
     switch (message) {
@@ -49,8 +70,17 @@ LRESULT CALLBACK MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM
             InvalidateRect(window, nullptr, TRUE);
             return 0;
         }
+        case WM_DRAWITEM:
+            DrawLauncherButton(static_cast<std::uint32_t>(wParam),
+                               *reinterpret_cast<const DRAWITEMSTRUCT*>(lParam));
+            return 0;
         case WM_COMMAND:
-            launcher.menu.OnCommand(static_cast<std::uint32_t>(wParam));
+            if (wParam == kCmdAbout) {
+                PlayClickSound();
+                ShowAboutBox(window);
+            } else {
+                launcher.menu.OnCommand(static_cast<std::uint32_t>(wParam));
+            }
             return 0;
         case kBringToFrontMessage:
             ShowWindow(launcher.mainWindow, SW_SHOWNORMAL);

@@ -216,7 +216,7 @@ TEST_F(Screens, WithoutALanguageTheLanguageSelectionPictureShowsWithoutCaptions)
     DeleteObject(resource);
     FreeLibrary(program);
     ExpectPictureShows(*shot, list);
-    EXPECT_EQ(CaptionInk(*shot, list, 187, 237), 0);
+    EXPECT_EQ(CaptionInk(*shot, list, 329, 332), 0);
     EXPECT_EQ(CaptionInk(*shot, list, 398, 443), 0);
 }
 
