@@ -266,3 +266,30 @@ void MaskedBlend(const DibBitmap* a, DibPoint pa, const DibBitmap* b, DibPoint p
         for (std::int32_t r = rows - 1; r >= 0; --r) blendRow(r);
     }
 }
+
+void MaskedRestore(const DibBitmap* a, DibPoint pa, const DibBitmap* mask, DibPoint pm,
+                   DibBitmap* d, DibPoint pd, DibSize size) {
+    Rows ra;
+    Rows rm;
+    Rows rd;
+    Byte* dBottom = nullptr;
+    if (!ReadRows(a, ra) || !ReadRows(mask, rm)) return;
+    if (!DibRowInfo(d, dBottom, rd.stride, rd.bitCount) || !DibDimensions(d, rd.width, rd.height)) {
+        return;
+    }
+    if (ra.bitCount != rd.bitCount || rm.bitCount != 8) return;
+    if (ra.bitCount != 8 && ra.bitCount != 24) return;
+    const std::size_t pixelBytes = ra.bitCount / 8;
+    const std::int32_t rows = InsideCount(size.height, {pa.y, pm.y, pd.y, pd.y},
+                                          {ra.height, rm.height, rd.height, rd.height});
+    const std::int32_t columns = InsideCount(size.width, {pa.x, pm.x, pd.x, pd.x},
+                                             {ra.width, rm.width, rd.width, rd.width});
+    for (std::int32_t r = 0; r < rows; ++r) {
+        const Byte* rowA = ra.bottomRow + TopDownRowOffset(ra, pa.y + r) + pa.x * pixelBytes;
+        const Byte* rowM = rm.bottomRow + TopDownRowOffset(rm, pm.y + r) + pm.x;
+        Byte* rowD = dBottom + TopDownRowOffset(rd, pd.y + r) + pd.x * pixelBytes;
+        for (std::int32_t c = 0; c < columns; ++c) {
+            if (rowM[c] != 0) std::memcpy(rowD + c * pixelBytes, rowA + c * pixelBytes, pixelBytes);
+        }
+    }
+}

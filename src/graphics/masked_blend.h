@@ -28,4 +28,10 @@ struct DibSize {
 void MaskedBlend(const DibBitmap* a, DibPoint pa, const DibBitmap* b, DibPoint pb,
                  const DibBitmap* mask, DibPoint pm, DibBitmap* d, DibPoint pd, DibSize size);
 
+// Puts A back into D wherever the mask is not 0, whole pixels, clipped like MaskedBlend. A face
+// that is taken away this way leaves nothing of itself behind, not even in its soft edge, where
+// blending the background back in would keep part of the old face.
+void MaskedRestore(const DibBitmap* a, DibPoint pa, const DibBitmap* mask, DibPoint pm,
+                   DibBitmap* d, DibPoint pd, DibSize size);
+
 #endif

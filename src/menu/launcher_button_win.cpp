@@ -128,13 +128,14 @@ void VemoLauncherButton::Draw(ButtonState state, HDC dc) {
     std::int32_t faceWidth = 0;
     std::int32_t faceHeight = 0;
     if (!mask || !DibDimensions(face, faceWidth, faceHeight)) return;
-    // Where the previous face was opaque, the untouched background comes back first, so a
-    // smaller new face leaves no rim of the old one.
-    const DibBitmap* previousMask = lastState == kNotDrawn ? nullptr : IconMaskFor(lastState, imageIndex);
+    // Wherever the previous face covered anything, the untouched background comes back first,
+    // so a smaller new face leaves no rim of the old one (a hover glow included).
+    const DibBitmap* previousMask =
+        lastState == kNotDrawn ? nullptr : IconMaskFor(lastState, imageIndex);
     if (!previousMask) previousMask = mask;
     DibBitmap* working = launcher.workingBackground.get();
-    MaskedBlend(ShownBackground(), {x, y}, working, {x, y}, previousMask, {0, 0}, working, {x, y},
-                {faceWidth, faceHeight});
+    MaskedRestore(ShownBackground(), {x, y}, previousMask, {0, 0}, working, {x, y},
+                  {faceWidth, faceHeight});
     MaskedBlend(face, {0, 0}, working, {x, y}, mask, {0, 0}, working, {x, y},
                 {faceWidth, faceHeight});
     CopyOut(dc, x, y, faceWidth, faceHeight);

@@ -7,87 +7,13 @@
 #include <vector>
 
 #include "e2e_support_win.h"
+#include "launcher_driver_win.h"
 #include "locale/config_win.h"
 #include "sample_disc_win.h"
 #include "test_support_win.h"
 
 namespace {
 
-// The client area of a window as it is on the screen, top-down 32-bit pixels.
-class Screenshot {
-public:
-    explicit Screenshot(HWND window) {
-        RECT client{};
-        GetClientRect(window, &client);
-        width_ = client.right;
-        height_ = client.bottom;
-        POINT origin{0, 0};
-        ClientToScreen(window, &origin);
-        BITMAPINFO info = Info();
-        HDC screen = GetDC(nullptr);
-        HDC memory = CreateCompatibleDC(screen);
-        void* bits = nullptr;
-        HBITMAP bitmap = CreateDIBSection(memory, &info, DIB_RGB_COLORS, &bits, nullptr, 0);
-        HGDIOBJ previous = SelectObject(memory, bitmap);
-        BitBlt(memory, 0, 0, width_, height_, screen, origin.x, origin.y, SRCCOPY);
-        GdiFlush();
-        pixels_.assign(static_cast<const std::uint32_t*>(bits),
-                       static_cast<const std::uint32_t*>(bits) + width_ * height_);
-        SelectObject(memory, previous);
-        DeleteObject(bitmap);
-        DeleteDC(memory);
-        ReleaseDC(nullptr, screen);
-    }
-
-    // The pixels of a picture, read the same way.
-    explicit Screenshot(HBITMAP picture) {
-        BITMAP info{};
-        GetObjectW(picture, sizeof(info), &info);
-        width_ = info.bmWidth;
-        height_ = info.bmHeight;
-        BITMAPINFO layout = Info();
-        pixels_.resize(static_cast<std::size_t>(width_ * height_));
-        HDC screen = GetDC(nullptr);
-        GetDIBits(screen, picture, 0, static_cast<UINT>(height_), pixels_.data(), &layout,
-                  DIB_RGB_COLORS);
-        ReleaseDC(nullptr, screen);
-    }
-
-    int Width() const { return width_; }
-    int Height() const { return height_; }
-    Rgb At(int x, int y) const {
-        std::uint32_t p = pixels_[static_cast<std::size_t>(y * width_ + x)];
-        return {static_cast<std::uint8_t>(p >> 16), static_cast<std::uint8_t>(p >> 8),
-                static_cast<std::uint8_t>(p)};
-    }
-
-    void SaveAs(const std::wstring& path) const {
-        BITMAPINFO info = Info();
-        BITMAPFILEHEADER file{};
-        file.bfType = 0x4D42;
-        file.bfOffBits = sizeof(file) + sizeof(info.bmiHeader);
-        file.bfSize = file.bfOffBits + static_cast<DWORD>(pixels_.size() * 4);
-        HANDLE out = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
-                                 FILE_ATTRIBUTE_NORMAL, nullptr);
-        if (out == INVALID_HANDLE_VALUE) return;
-        DWORD written = 0;
-        WriteFile(out, &file, sizeof(file), &written, nullptr);
-        WriteFile(out, &info.bmiHeader, sizeof(info.bmiHeader), &written, nullptr);
-        WriteFile(out, pixels_.data(), static_cast<DWORD>(pixels_.size() * 4), &written, nullptr);
-        CloseHandle(out);
-    }
-
-private:
-    BITMAPINFO Info() const { return TopDownInfo(width_, height_); }
-
-    int width_ = 0;
-    int height_ = 0;
-    std::vector<std::uint32_t> pixels_;
-};
-
-int Distance(Rgb a, Rgb b) {
-    return std::abs(a.r - b.r) + std::abs(a.g - b.g) + std::abs(a.b - b.b);
-}
 
 // Points of the window where neither buttons nor captions ever are.
 const POINT kPlainPoints[] = {{620, 10}, {600, 470}, {150, 300}, {10, 150}, {480, 360}};
@@ -95,7 +21,7 @@ const POINT kPlainPoints[] = {{620, 10}, {600, 470}, {150, 300}, {10, 150}, {480
 void ExpectPictureShows(const Screenshot& shot, const Screenshot& picture) {
     for (POINT point : kPlainPoints) {
         SCOPED_TRACE(testing::Message() << "at " << point.x << "," << point.y);
-        EXPECT_LE(Distance(shot.At(point.x, point.y), picture.At(point.x, point.y)), 6);
+        EXPECT_LE(ColorDistance(shot.At(point.x, point.y), picture.At(point.x, point.y)), 6);
     }
 }
 
@@ -107,7 +33,7 @@ int CaptionInk(const Screenshot& shot, const Screenshot& picture, int right, int
         for (int x = std::max(0, right - 200); x <= right; ++x) {
             Rgb c = shot.At(x, y);
             Rgb under = picture.At(x, y);
-            if (Distance(c, under) > 90 && c.b >= c.r && c.b >= c.g) ++ink;
+            if (ColorDistance(c, under) > 90 && c.b >= c.r && c.b >= c.g) ++ink;
         }
     }
     return ink;
@@ -145,13 +71,6 @@ protected:
         return shot;
     }
 
-    void Save(const Screenshot& shot, const std::wstring& name) {
-        wchar_t folder[MAX_PATH];
-        DWORD length = GetEnvironmentVariableW(L"AUTOPLAY_SCREENSHOT_DIR", folder, MAX_PATH);
-        if (length == 0 || length >= MAX_PATH) return;
-        shot.SaveAs(std::wstring(folder) + L"\\" + name + L".bmp");
-    }
-
     SampleDisc disc;
     TestProcess launcher;
 };
@@ -182,7 +101,7 @@ TEST_F(Screens, EachLanguageShowsItsOwnBackgroundAndCaptions) {
         ASSERT_TRUE(shot) << "no window";
         ASSERT_EQ(shot->Width(), 640);
         ASSERT_EQ(shot->Height(), 480);
-        Save(*shot, screen.name);
+        shot->SaveForReadme(screen.name);
         HBITMAP file = static_cast<HBITMAP>(LoadImageW(
             nullptr, disc.Path(screen.background).c_str(), IMAGE_BITMAP, 0, 0, LR_LOADFROMFILE));
         ASSERT_TRUE(file);
@@ -205,7 +124,7 @@ TEST_F(Screens, EachLanguageShowsItsOwnBackgroundAndCaptions) {
 TEST_F(Screens, WithoutALanguageTheLanguageSelectionPictureShowsWithoutCaptions) {
     std::optional<Screenshot> shot = Show(L"");
     ASSERT_TRUE(shot) << "no window";
-    Save(*shot, L"language-list");
+    shot->SaveForReadme(L"language-list");
     HMODULE program = LoadLibraryExW(disc.Launcher().c_str(), nullptr,
                                      LOAD_LIBRARY_AS_DATAFILE | LOAD_LIBRARY_AS_IMAGE_RESOURCE);
     ASSERT_TRUE(program);
