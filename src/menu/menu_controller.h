@@ -49,6 +49,11 @@ public:
     // Everything a button (or the start-up failure path) asks for.
     void OnCommand(std::uint32_t id);
 
+    // Keyboard use: Tab, Shift+Tab and the arrows move the focus among the visible buttons,
+    // Enter presses the focused one (Space is the button's own), Escape closes an open panel.
+    // True when the key was the menu's; `focus` is the window that has the keyboard focus.
+    bool HandleKey(std::uint32_t virtualKey, bool shift, HWND focus);
+
     LauncherButton* ButtonForWindow(HWND window) const;
 
     std::array<std::vector<LauncherButton*>, kPageCount> pages;
@@ -73,6 +78,8 @@ private:
     void ShowInstallOrPlay();
     // Running out of memory while a screen is built keeps the buttons built so far.
     void BuildSafely(void (MenuController::*build)(HWND), HWND parent);
+
+    void MoveKeyboardFocus(int step, HWND focus);
 
     // The command actions.
     void ChooseLanguage(std::uint32_t id);

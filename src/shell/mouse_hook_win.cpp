@@ -1,5 +1,7 @@
 #include "shell/mouse_hook_win.h"
 
+#include <climits>
+
 #include "shell/launcher_state.h"
 
 namespace {
@@ -8,6 +10,8 @@ struct HookState {
     HHOOK hookHandle = nullptr;
     bool hookInstalled = false;
     HWND focusWindow = nullptr;
+    // Where the mouse was at the last move the hook acted on.
+    POINT lastPoint{LONG_MIN, LONG_MIN};
 };
 HookState hook;
 
@@ -63,9 +67,18 @@ int SetMouseHook(HINSTANCE instance, HWND /*window*/, bool install) {
 
 LRESULT CALLBACK MouseHookProc(int code, WPARAM wParam, LPARAM lParam) {
     if (code >= 0 && launcher.appActive && LOWORD(wParam) == WM_MOUSEMOVE && lParam) {
-        FollowMouse(*reinterpret_cast<const MOUSEHOOKSTRUCT*>(lParam));
+        const auto& mouse = *reinterpret_cast<const MOUSEHOOKSTRUCT*>(lParam);
+        // The system also sends a move, at the same point, when a window appears or goes
+        // under a resting mouse; only a real move takes the focus from where the keyboard
+        // put it.
+        if (mouse.pt.x != hook.lastPoint.x || mouse.pt.y != hook.lastPoint.y) {
+            hook.lastPoint = mouse.pt;
+            FollowMouse(mouse);
+        }
     }
     return CallNextHookEx(hook.hookHandle, code, LOWORD(wParam), lParam);
 }
 
 HWND HoverFocusWindow() { return hook.focusWindow; }
+
+void NoteKeyboardFocus(HWND window) { hook.focusWindow = window; }

@@ -15,5 +15,7 @@ LRESULT CALLBACK MouseHookProc(int code, WPARAM wParam, LPARAM lParam);
 
 // The window to which the hook last gave the focus.
 HWND HoverFocusWindow();
+// The keyboard moved the focus: the next mouse move gives it to what is under the mouse again.
+void NoteKeyboardFocus(HWND window);
 
 #endif

@@ -72,6 +72,21 @@ void ReportNotOnDisc() {
     if (!UninstallEntryExists()) launcher.menu.OnCommand(kInstallCommand);
 }
 
+// Keys for the menu (Tab, the arrows, Enter, Escape) are taken before the focused button sees
+// them, as a dialog's own loop would.
+bool TakeMenuKey(const MSG& message) {
+    if (message.message != WM_KEYDOWN || !launcher.mainWindow) return false;
+    if (message.hwnd != launcher.mainWindow && GetParent(message.hwnd) != launcher.mainWindow) {
+        return false;
+    }
+    const bool shift = GetKeyState(VK_SHIFT) < 0;
+    if (!launcher.menu.HandleKey(static_cast<std::uint32_t>(message.wParam), shift, GetFocus())) {
+        return false;
+    }
+    NoteKeyboardFocus(GetFocus());
+    return true;
+}
+
 int RunMessageLoop() {
     MSG message{};
     for (;;) {
@@ -79,6 +94,7 @@ int RunMessageLoop() {
         // -1: the loop itself failed; there is no quit message to take a code from.
         if (result == -1) return 0;
         if (result == 0) return static_cast<int>(message.wParam);
+        if (TakeMenuKey(message)) continue;
         TranslateMessage(&message);
         DispatchMessageW(&message);
     }

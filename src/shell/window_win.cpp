@@ -9,6 +9,25 @@
 
 namespace {
 
+// The button that had the keyboard focus when the launcher was left, so that coming back (from
+// the readme, a message box, another program) puts the focus where the user left it.
+HWND focusWhenLeft = nullptr;
+
+void RememberFocus(HWND window) {
+    HWND focus = GetFocus();
+    focusWhenLeft = focus && GetParent(focus) == window ? focus : nullptr;
+}
+
+void RestoreFocus(HWND window) {
+    if (focusWhenLeft && IsWindowVisible(focusWhenLeft) && GetParent(focusWhenLeft) == window) {
+        SetFocus(focusWhenLeft);
+    } else {
+        // Keys must reach the launcher, not fall through as system keys to a window without
+        // focus.
+        SetFocus(window);
+    }
+}
+
 void DrawLauncherButton(std::uint32_t id, const DRAWITEMSTRUCT& item) {
     // A paint of the window restored the pristine background under every button, so after each
     // paint every button draws itself again, once and completely.
@@ -33,9 +52,11 @@ LRESULT CALLBACK MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM
         case WM_ACTIVATE:
             if (LOWORD(wParam) == WA_INACTIVE) {
                 launcher.appActive = false;
+                RememberFocus(window);
             } else {
                 launcher.appActive = true;
                 launcher.menu.Refresh();
+                RestoreFocus(window);
             }
             return 0;
         case WM_PAINT: {
