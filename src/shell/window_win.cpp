@@ -1,5 +1,7 @@
 #include "shell/window_win.h"
 
+#include <new>
+
 #include "actions/command_ids.h"
 #include "actions/commands_win.h"
 #include "graphics/painting_win.h"
@@ -42,9 +44,23 @@ void DrawLauncherButton(std::uint32_t id, const DRAWITEMSTRUCT& item) {
     launcher.menu.DrawButton(item.hDC, id, item.itemState);
 }
 
+LRESULT HandleMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
+
 }  // namespace
 
 LRESULT CALLBACK MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    // Nothing may unwind through the system's frames: a message that runs out of memory is
+    // dropped, and the launcher goes on with what it has.
+    try {
+        return HandleMessage(window, message, wParam, lParam);
+    } catch (const std::bad_alloc&) {
+        return 0;
+    }
+}
+
+namespace {
+
+LRESULT HandleMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
     switch (message) {
         case WM_DESTROY:
             PostQuitMessage(0);
@@ -111,3 +127,5 @@ LRESULT CALLBACK MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM
             return DefWindowProcW(window, message, wParam, lParam);
     }
 }
+
+}  // namespace
