@@ -12,8 +12,9 @@
 // "-l" and the installer's language id in four lower-case hexadecimal digits.
 std::wstring InstallerParameters(LanguageBase base);
 
-// The installer's folder on the disc.
+// The installer's folder on the disc, and the installer in it.
 std::wstring SetupFolder(std::wstring_view rootPath);
+inline constexpr wchar_t kInstallerProgram[] = L"setup.exe";
 
 // The two files that prove Disc 1 is in the drive.
 std::wstring FirstDiscFile(std::wstring_view rootPath);

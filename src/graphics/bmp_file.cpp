@@ -1,6 +1,7 @@
 #include "graphics/bmp_file.h"
 
 #include <cstring>
+#include <vector>
 
 namespace {
 
@@ -8,6 +9,8 @@ constexpr std::size_t kFileHeaderSize = 14;
 constexpr std::uint32_t kCoreHeaderSize = 12;
 // Pictures larger than this on either side are not launcher pictures.
 constexpr std::int64_t kLargestSide = 16384;
+// Leaves room for a file header in front within the 32-bit sizes of bitmap files.
+constexpr std::size_t kLargestPackedDib = 0x7FFFFFFF;
 
 std::uint32_t Read32(const std::uint8_t* at) {
     std::uint32_t value;
@@ -94,4 +97,30 @@ bool BmpFileIsWhole(const std::uint8_t* data, std::size_t size) {
             return false;
     }
     return pixelOffset + pixelBytes <= size;
+}
+
+std::optional<DibHeaderFields> WholeBmpFileHeader(const std::uint8_t* data, std::size_t size) {
+    if (!BmpFileIsWhole(data, size)) return std::nullopt;
+    return DibReadHeader(data + kFileHeaderSize);
+}
+
+std::optional<DibHeaderFields> WholePackedDibHeader(const std::uint8_t* data, std::size_t size) {
+    // DibReadHeader reads the 40-byte layout for every header but the 12-byte core one.
+    if (data == nullptr || size < 4 || size > kLargestPackedDib) return std::nullopt;
+    const std::uint32_t headerSize = Read32(data);
+    if (headerSize > size ||
+        size < (headerSize == kCoreHeaderSize ? kCoreHeaderSize : kDibInfoHeaderSize)) {
+        return std::nullopt;
+    }
+    // The rows follow the colour table, as Windows reads a packed bitmap: in front of a file
+    // header saying so, the block gets the very check a file from the disc gets.
+    const std::uint32_t pixelOffset = kFileHeaderSize + headerSize + DibColorTableSize(data);
+    std::vector<std::uint8_t> file(kFileHeaderSize);
+    file[0] = 'B';
+    file[1] = 'M';
+    const auto fileSize = static_cast<std::uint32_t>(kFileHeaderSize + size);
+    std::memcpy(&file[2], &fileSize, 4);
+    std::memcpy(&file[10], &pixelOffset, 4);
+    file.insert(file.end(), data, data + size);
+    return WholeBmpFileHeader(file.data(), file.size());
 }

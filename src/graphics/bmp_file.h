@@ -6,10 +6,21 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <optional>
+
+#include "graphics/dib.h"
 
 // True when the bytes are a whole bitmap file: the file header, a known info header, its
 // colour table and every pixel row (or the compressed image it names) lie inside the file,
 // and width, height and depth are those of a real picture.
 bool BmpFileIsWhole(const std::uint8_t* data, std::size_t size);
+
+// What a checked picture holds, for the disc check to say what is wrong with a picture that
+// the launcher would refuse or misdraw. The height keeps its sign (negative: top-down rows).
+// The header of a file BmpFileIsWhole accepts; nothing for any other file.
+std::optional<DibHeaderFields> WholeBmpFileHeader(const std::uint8_t* data, std::size_t size);
+// The same check for a packed bitmap as a bitmap resource holds it: the header, its colour
+// table and then the rows (or the compressed image), without the file header.
+std::optional<DibHeaderFields> WholePackedDibHeader(const std::uint8_t* data, std::size_t size);
 
 #endif
