@@ -154,6 +154,28 @@ TEST_F(Configuration, NoProductKeyLeavesTheLanguageUnsettled) {
     EXPECT_TRUE(UninstallEntryExists());
 }
 
+// A 32-bit installer writes to the 32-bit view; a value only in the 64-bit view is none of the
+// product's, whichever build of the launcher reads it.
+TEST_F(Configuration, ProductKeysAreReadFromTheThirtyTwoBitView) {
+    {
+        ScopedMachineKey product(kProductKeyPath, KEY_WOW64_32KEY);
+        product.SetText(L"VEMO_LANGUAGE", L"Korean");
+        ScopedMachineKey uninstall(kUninstallKeyPath, KEY_WOW64_32KEY);
+        EXPECT_EQ(Read().base, kKorean);
+        EXPECT_TRUE(UninstallEntryExists());
+    }
+    ResetLauncherConfiguration();
+    ScopedMachineKey product(kProductKeyPath, KEY_WOW64_64KEY);
+    product.SetText(L"VEMO_LANGUAGE", L"Korean");
+    product.SetDword(L"VEMO_SKU", 4);
+    ScopedMachineKey uninstall(kUninstallKeyPath, KEY_WOW64_64KEY);
+    Outcome outcome = Read();
+    EXPECT_EQ(outcome.base, kNoLanguage);
+    EXPECT_FALSE(outcome.known);
+    EXPECT_EQ(launcher.productSku, 0u);
+    EXPECT_FALSE(UninstallEntryExists());
+}
+
 TEST_F(Configuration, StoredTextWithoutTerminatorIsReadSafely) {
     ScopedMachineKey product(kProductKeyPath);
     product.SetUnterminatedText(L"VEMO_LANGUAGE", L"German");
@@ -242,8 +264,9 @@ TEST_F(Configuration, LocaleValueNamesTheMenuLanguageWithoutItsTerminator) {
         launcher.languageBase = row.base;
         WriteLocale();
         HKEY key = nullptr;
-        ASSERT_EQ(RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ, &key),
-                  ERROR_SUCCESS);
+        ASSERT_EQ(
+            RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ | KEY_WOW64_32KEY, &key),
+            ERROR_SUCCESS);
         wchar_t data[32] = {};
         DWORD size = sizeof(data);
         DWORD type = 0;
@@ -260,6 +283,12 @@ TEST_F(Configuration, LocaleValueNamesTheMenuLanguageWithoutItsTerminator) {
         EXPECT_EQ(size, written);
         EXPECT_EQ(std::wstring(data, size / sizeof(wchar_t)), row.code);
     }
+    HKEY other = nullptr;
+    EXPECT_NE(
+        RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ | KEY_WOW64_64KEY, &other),
+        ERROR_SUCCESS)
+        << "written to the 64-bit view";
+    if (other) RegCloseKey(other);
 }
 
 }  // namespace
