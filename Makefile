@@ -23,7 +23,8 @@ host: deps
 define cross_build
 	cmake -S . -B $(BUILD)/$(1) -DCMAKE_BUILD_TYPE=Release \
 	    -DCMAKE_TOOLCHAIN_FILE=cmake/toolchain-$(1)-mingw.cmake \
-	    -DDISCART=$(abspath $(BUILD)/host/tools/discart/discart) -DDISC_SKU=$(SKU) >/dev/null
+	    -DDISCART=$(abspath $(BUILD)/host/tools/discart/discart) -DDISC_SKU=$(SKU) \
+	    -DRUNFROMSWAP=$(abspath $(BUILD)/host/tools/runfromswap/runfromswap) >/dev/null
 	cmake --build $(BUILD)/$(1) -j$(JOBS) $(2)
 endef
 
