@@ -37,6 +37,12 @@ protected:
     void SetUp() override { ResetLauncherConfiguration(); }
 };
 
+// Japanese and Chinese end a sentence with a full-width stop, which carries its own space:
+// ASCII spaces after it show as a gap.
+bool UsesFullWidthStops(LanguageBase base) {
+    return base == kJapanese || base == kTraditionalChinese || base == kSimplifiedChinese;
+}
+
 TEST_F(StringSets, EveryLanguageHasEveryOffsetAndFitsItsBuffer) {
     for (const LanguageInfo& language : Languages()) {
         for (std::uint32_t offset : kOffsets) {
@@ -44,9 +50,14 @@ TEST_F(StringSets, EveryLanguageHasEveryOffsetAndFitsItsBuffer) {
             std::wstring text = Load(language.base, offset);
             EXPECT_FALSE(text.empty());
             EXPECT_LT(text.size(), kMessageCapacity);
-            EXPECT_EQ(text.find(L"  ", 0) != std::wstring::npos,
-                      std::find(std::begin(kTwoSentenceOffsets), std::end(kTwoSentenceOffsets),
-                                offset) != std::end(kTwoSentenceOffsets));
+            const bool twoSentences =
+                std::find(std::begin(kTwoSentenceOffsets), std::end(kTwoSentenceOffsets), offset) !=
+                std::end(kTwoSentenceOffsets);
+            const bool fullWidth = UsesFullWidthStops(language.base);
+            EXPECT_EQ(text.find(L"  ") != std::wstring::npos, twoSentences && !fullWidth);
+            if (fullWidth) {
+                EXPECT_EQ(text.find(L"\u3002 "), std::wstring::npos);
+            }
         }
         for (std::uint32_t offset : kCaptionOffsets) {
             SCOPED_TRACE(testing::Message() << "caption " << language.base + offset);
