@@ -115,18 +115,6 @@ TEST_F(StringSets, UkEnglishDiffersFromUsEnglishOnlyInTheHelpLabelAndSite) {
     EXPECT_EQ(Load(kUsEnglish, kStrSupportTool), L"Trivex");
 }
 
-TEST_F(StringSets, UsEnglishTextsAreTheProductsOwn) {
-    EXPECT_EQ(Load(kUsEnglish, kStrNotOnDiscText),
-              L"Autoplay will only run from The Vemo installation CD.  Exiting now.");
-    EXPECT_EQ(Load(kUsEnglish, kStrInsertDiscCaption), L"Insert Disc 1");
-    EXPECT_EQ(Load(kUsEnglish, kStrInsertDiscText),
-              L"To continue with this operation, please insert Disc 1 into the CD-ROM drive and "
-              L"click OK.");
-    EXPECT_EQ(Load(kUsEnglish, kStrDemoMissingFormat),
-              L"Sorry.  The demo %s can't be found on this CD.");
-    EXPECT_EQ(Load(kUsEnglish, kStrVisitWebSite), std::wstring(L"Visit ") + WebSiteFor(kUsEnglish));
-}
-
 TEST_F(StringSets, WebSiteLabelNamesTheLanguagesOwnSite) {
     for (const LanguageInfo& language : Languages()) {
         SCOPED_TRACE(language.base);
