@@ -24,7 +24,8 @@ define cross_build
 	cmake -S . -B $(BUILD)/$(1) -DCMAKE_BUILD_TYPE=Release \
 	    -DCMAKE_TOOLCHAIN_FILE=cmake/toolchain-$(1)-mingw.cmake \
 	    -DDISCART=$(abspath $(BUILD)/host/tools/discart/discart) -DDISC_SKU=$(SKU) \
-	    -DHOST_BUILD=$(abspath $(BUILD)/host) >/dev/null
+	    -DHOST_BUILD=$(abspath $(BUILD)/host) \
+	    -DRUNFROMSWAP=$(abspath $(BUILD)/host/tools/runfromswap/runfromswap) >/dev/null
 	cmake --build $(BUILD)/$(1) -j$(JOBS) $(2)
 endef
 

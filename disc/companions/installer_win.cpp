@@ -2,6 +2,7 @@
 
 #include "locale/config_win.h"
 #include "platform/handles_win.h"
+#include "platform/registry_win.h"
 
 namespace {
 
@@ -67,26 +68,8 @@ bool SetDword(HKEY key, const wchar_t* name, DWORD value) {
                           sizeof(value)) == ERROR_SUCCESS;
 }
 
-RegistryKey CreateMachineKey(const wchar_t* path) {
-    HKEY key = nullptr;
-    if (RegCreateKeyExW(HKEY_LOCAL_MACHINE, path, 0, nullptr, REG_OPTION_NON_VOLATILE,
-                        KEY_SET_VALUE, nullptr, &key, nullptr) != ERROR_SUCCESS) {
-        return RegistryKey();
-    }
-    return RegistryKey(key);
-}
-
-bool DeleteMachineKeyTree(const wchar_t* path) {
-    LONG result = RegDeleteTreeW(HKEY_LOCAL_MACHINE, path);
-    if (result == ERROR_FILE_NOT_FOUND) return true;
-    if (result != ERROR_SUCCESS) return false;
-    // Some versions of RegDeleteTreeW only empty the key; others take the key too.
-    result = RegDeleteKeyW(HKEY_LOCAL_MACHINE, path);
-    return result == ERROR_SUCCESS || result == ERROR_FILE_NOT_FOUND;
-}
-
 bool WriteProductKey(const InstallPlan& plan) {
-    RegistryKey key = CreateMachineKey(kProductKeyPath);
+    RegistryKey key = CreateKeyForWriting(HKEY_LOCAL_MACHINE, kProductKeyPath);
     if (!key) return false;
     bool written = SetText(key.Get(), L"Version", kVersion) &&
                    SetDword(key.Get(), L"EP8Installed", 1) &&
@@ -103,7 +86,7 @@ bool WriteProductKey(const InstallPlan& plan) {
 }
 
 bool WriteUninstallEntry(const InstallPlan& plan) {
-    RegistryKey key = CreateMachineKey(kUninstallKeyPath);
+    RegistryKey key = CreateKeyForWriting(HKEY_LOCAL_MACHINE, kUninstallKeyPath);
     if (!key) return false;
     return SetText(key.Get(), L"DisplayName", kProductTitle) &&
            SetText(key.Get(), L"DisplayVersion", kVersion) &&
@@ -126,11 +109,13 @@ bool RemovePrograms(const std::wstring& gameFolder) {
 }
 
 std::optional<std::wstring> InstalledGameFolder() {
+    RegistryKey key = OpenKeyForReading(HKEY_LOCAL_MACHINE, kProductKeyPath);
     wchar_t folder[MAX_PATH] = {};
     DWORD bytes = sizeof(folder);
     // RegGetValueW checks the type and terminates the text.
-    if (RegGetValueW(HKEY_LOCAL_MACHINE, kProductKeyPath, L"VEMO_DATA", RRF_RT_REG_SZ, nullptr,
-                     folder, &bytes) != ERROR_SUCCESS ||
+    if (!key ||
+        RegGetValueW(key.Get(), nullptr, L"VEMO_DATA", RRF_RT_REG_SZ, nullptr, folder, &bytes) !=
+            ERROR_SUCCESS ||
         folder[0] == L'\0') {
         return std::nullopt;
     }
@@ -175,21 +160,15 @@ bool Install(const InstallPlan& plan, std::wstring& error) {
         return true;
     }
     // A half installation would make the launcher offer Play for a game that cannot start.
-    DeleteMachineKeyTree(kProductKeyPath);
-    DeleteMachineKeyTree(kUninstallKeyPath);
+    DeleteKeyTree(HKEY_LOCAL_MACHINE, kProductKeyPath);
+    DeleteKeyTree(HKEY_LOCAL_MACHINE, kUninstallKeyPath);
     RemovePrograms(plan.gameFolder);
     return false;
 }
 
 bool IsInstalled() {
-    for (const wchar_t* path : {kProductKeyPath, kUninstallKeyPath}) {
-        HKEY key = nullptr;
-        if (RegOpenKeyExW(HKEY_LOCAL_MACHINE, path, 0, KEY_READ, &key) == ERROR_SUCCESS) {
-            RegCloseKey(key);
-            return true;
-        }
-    }
-    return false;
+    return OpenKeyForReading(HKEY_LOCAL_MACHINE, kProductKeyPath) ||
+           OpenKeyForReading(HKEY_LOCAL_MACHINE, kUninstallKeyPath);
 }
 
 bool Uninstall(std::wstring& error) {
@@ -203,7 +182,8 @@ bool Uninstall(std::wstring& error) {
                 L". Close The Vemo and The Vemo Creator, then try again.";
         return false;
     }
-    if (!DeleteMachineKeyTree(kProductKeyPath) || !DeleteMachineKeyTree(kUninstallKeyPath)) {
+    if (!DeleteKeyTree(HKEY_LOCAL_MACHINE, kProductKeyPath) ||
+        !DeleteKeyTree(HKEY_LOCAL_MACHINE, kUninstallKeyPath)) {
         error = L"Setup could not remove the settings of " + std::wstring(kProductTitle) +
                 L" from the registry.";
         return false;

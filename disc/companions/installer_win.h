@@ -1,6 +1,7 @@
 // Installing and removing The Vemo Vodizuri Virezazida: the game and its creator tool in
 // Program Files, the product's registry values that the launcher reads, and the uninstall
-// entry.
+// entry. Like the product's own 32-bit installer, it writes the 32-bit registry view, also
+// when built for x86_64.
 #ifndef AUTOPLAY_DISC_INSTALLER_WIN_H
 #define AUTOPLAY_DISC_INSTALLER_WIN_H
 

@@ -95,12 +95,8 @@ void DeleteUninstallEntry() { RegDeleteKeyW(HKEY_LOCAL_MACHINE, kUninstallKeyPat
 
 void WriteLocale() {
     const wchar_t* code = LocaleCodeFor(launcher.languageBase);
-    HKEY created = nullptr;
-    if (RegCreateKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, nullptr, REG_OPTION_NON_VOLATILE,
-                        KEY_ALL_ACCESS, nullptr, &created, nullptr) != ERROR_SUCCESS) {
-        return;
-    }
-    RegistryKey key(created);
+    RegistryKey key = CreateKeyForWriting(HKEY_LOCAL_MACHINE, kLocaleKeyPath);
+    if (!key) return;
     // The stored length leaves out the terminator, as readers of this value expect.
     DWORD bytes = static_cast<DWORD>(wcslen(code) * sizeof(wchar_t));
     RegSetValueExW(key.Get(), launcher.emptyText, 0, REG_SZ, reinterpret_cast<const BYTE*>(code),

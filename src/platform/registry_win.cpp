@@ -4,8 +4,37 @@
 
 RegistryKey OpenKeyForReading(HKEY root, const wchar_t* path) {
     HKEY key = nullptr;
-    if (RegOpenKeyExW(root, path, 0, KEY_READ, &key) != ERROR_SUCCESS) return RegistryKey();
+    if (RegOpenKeyExW(root, path, 0, KEY_READ | kProductRegistryView, &key) != ERROR_SUCCESS) {
+        return RegistryKey();
+    }
     return RegistryKey(key);
+}
+
+RegistryKey CreateKeyForWriting(HKEY root, const wchar_t* path) {
+    HKEY key = nullptr;
+    if (RegCreateKeyExW(root, path, 0, nullptr, REG_OPTION_NON_VOLATILE,
+                        KEY_ALL_ACCESS | kProductRegistryView, nullptr, &key,
+                        nullptr) != ERROR_SUCCESS) {
+        return RegistryKey();
+    }
+    return RegistryKey(key);
+}
+
+bool DeleteKeyTree(HKEY root, const wchar_t* path) {
+    // RegDeleteTreeW takes no view, so the key is opened in the view first and emptied through
+    // that handle; RegDeleteKeyExW then removes the key itself from the same view.
+    HKEY opened = nullptr;
+    LONG result = RegOpenKeyExW(
+        root, path, 0,
+        DELETE | KEY_ENUMERATE_SUB_KEYS | KEY_QUERY_VALUE | KEY_SET_VALUE | kProductRegistryView,
+        &opened);
+    if (result == ERROR_FILE_NOT_FOUND) return true;
+    if (result != ERROR_SUCCESS) return false;
+    RegistryKey key(opened);
+    if (RegDeleteTreeW(key.Get(), nullptr) != ERROR_SUCCESS) return false;
+    key.Reset();
+    result = RegDeleteKeyExW(root, path, kProductRegistryView, 0);
+    return result == ERROR_SUCCESS || result == ERROR_FILE_NOT_FOUND;
 }
 
 bool QueryData(HKEY key, const wchar_t* name, BYTE* buffer, DWORD& size, DWORD* type) {

@@ -7,6 +7,7 @@
 
 #include "e2e_support_win.h"
 #include "locale/config_win.h"
+#include "platform/handles_win.h"
 #include "sample_disc_win.h"
 #include "shell/launcher_state.h"
 #include "test_support_win.h"
@@ -33,28 +34,37 @@ bool Exists(const std::wstring& path) {
     return GetFileAttributesW(path.c_str()) != INVALID_FILE_ATTRIBUTES;
 }
 
-bool KeyExists(const wchar_t* path) {
+// setup.exe writes where a 32-bit installer writes: the 32-bit registry view.
+RegistryKey OpenInstallerKey(const wchar_t* path) {
     HKEY key = nullptr;
-    if (RegOpenKeyExW(HKEY_LOCAL_MACHINE, path, 0, KEY_READ, &key) != ERROR_SUCCESS) return false;
-    RegCloseKey(key);
-    return true;
+    if (RegOpenKeyExW(HKEY_LOCAL_MACHINE, path, 0, KEY_READ | KEY_WOW64_32KEY, &key) !=
+        ERROR_SUCCESS) {
+        return RegistryKey();
+    }
+    return RegistryKey(key);
+}
+
+bool KeyExists(const wchar_t* path) {
+    return static_cast<bool>(OpenInstallerKey(path));
 }
 
 std::optional<std::wstring> TextValue(const wchar_t* keyPath, const wchar_t* name) {
+    RegistryKey key = OpenInstallerKey(keyPath);
     wchar_t text[512] = {};
     DWORD bytes = sizeof(text);
-    if (RegGetValueW(HKEY_LOCAL_MACHINE, keyPath, name, RRF_RT_REG_SZ, nullptr, text, &bytes) !=
-        ERROR_SUCCESS) {
+    if (!key || RegGetValueW(key.Get(), nullptr, name, RRF_RT_REG_SZ, nullptr, text, &bytes) !=
+                    ERROR_SUCCESS) {
         return std::nullopt;
     }
     return std::wstring(text);
 }
 
 std::optional<DWORD> DwordValue(const wchar_t* keyPath, const wchar_t* name) {
+    RegistryKey key = OpenInstallerKey(keyPath);
     DWORD value = 0;
     DWORD bytes = sizeof(value);
-    if (RegGetValueW(HKEY_LOCAL_MACHINE, keyPath, name, RRF_RT_REG_DWORD, nullptr, &value,
-                     &bytes) != ERROR_SUCCESS) {
+    if (!key || RegGetValueW(key.Get(), nullptr, name, RRF_RT_REG_DWORD, nullptr, &value, &bytes) !=
+                    ERROR_SUCCESS) {
         return std::nullopt;
     }
     return value;

@@ -7,20 +7,26 @@
 #include "platform/text_win.h"
 #include "shell/launcher_state.h"
 
-void DeleteMachineKey(const wchar_t* path) {
-    LONG result = RegDeleteTreeW(HKEY_LOCAL_MACHINE, path);
-    if (result == ERROR_SUCCESS) RegDeleteKeyW(HKEY_LOCAL_MACHINE, path);
+void DeleteMachineKey(const wchar_t* path, REGSAM view) {
+    // RegDeleteTreeW has no view of its own: it works below a key opened in one.
+    HKEY key = nullptr;
+    if (RegOpenKeyExW(HKEY_LOCAL_MACHINE, path, 0, KEY_ALL_ACCESS | view, &key) != ERROR_SUCCESS) {
+        return;
+    }
+    RegDeleteTreeW(key, nullptr);
+    RegCloseKey(key);
+    RegDeleteKeyExW(HKEY_LOCAL_MACHINE, path, view, 0);
 }
 
-ScopedMachineKey::ScopedMachineKey(const wchar_t* path) : path_(path) {
-    LONG result = RegCreateKeyExW(HKEY_LOCAL_MACHINE, path, 0, nullptr, 0, KEY_ALL_ACCESS, nullptr,
-                                  &key_, nullptr);
+ScopedMachineKey::ScopedMachineKey(const wchar_t* path, REGSAM view) : path_(path), view_(view) {
+    LONG result = RegCreateKeyExW(HKEY_LOCAL_MACHINE, path, 0, nullptr, 0, KEY_ALL_ACCESS | view,
+                                  nullptr, &key_, nullptr);
     EXPECT_EQ(result, ERROR_SUCCESS);
 }
 
 ScopedMachineKey::~ScopedMachineKey() {
     if (key_) RegCloseKey(key_);
-    DeleteMachineKey(path_.c_str());
+    DeleteMachineKey(path_.c_str(), view_);
 }
 
 void ScopedMachineKey::SetText(const wchar_t* name, const std::wstring& text) {

@@ -10,15 +10,17 @@
 #include <string>
 
 #include "locale/language_table.h"
+#include "platform/registry_win.h"
 
-// Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine.
-void DeleteMachineKey(const wchar_t* path);
+// Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine. Keys are
+// in the product's registry view (the 32-bit one) unless a test asks for the other.
+void DeleteMachineKey(const wchar_t* path, REGSAM view = kProductRegistryView);
 
 // An HKEY_LOCAL_MACHINE key created for one test and deleted with everything below it when
 // the test ends.
 class ScopedMachineKey {
 public:
-    explicit ScopedMachineKey(const wchar_t* path);
+    explicit ScopedMachineKey(const wchar_t* path, REGSAM view = kProductRegistryView);
     ~ScopedMachineKey();
     ScopedMachineKey(const ScopedMachineKey&) = delete;
     ScopedMachineKey& operator=(const ScopedMachineKey&) = delete;
@@ -32,6 +34,7 @@ public:
 
 private:
     std::wstring path_;
+    REGSAM view_;
     HKEY key_ = nullptr;
 };
 
