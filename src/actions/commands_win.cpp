@@ -122,7 +122,7 @@ void MenuController::StartInstaller() {
     CloseOpenPanel();
     const std::wstring parameters = InstallerParameters(launcher.languageBase);
     const std::wstring folder = SetupFolder(launcher.rootPath);
-    OpenWithShell(launcher.mainWindow, L"setup.exe", parameters.c_str(), folder.c_str());
+    OpenWithShell(launcher.mainWindow, kInstallerProgram, parameters.c_str(), folder.c_str());
 }
 
 void MenuController::OpenWebSite() {

@@ -91,7 +91,7 @@ bool UninstallEntryExists() {
     return static_cast<bool>(OpenKeyForReading(HKEY_LOCAL_MACHINE, kUninstallKeyPath));
 }
 
-void DeleteUninstallEntry() { RegDeleteKeyW(HKEY_LOCAL_MACHINE, kUninstallKeyPath); }
+void DeleteUninstallEntry() { DeleteKeyTree(HKEY_LOCAL_MACHINE, kUninstallKeyPath); }
 
 void WriteLocale() {
     const wchar_t* code = LocaleCodeFor(launcher.languageBase);

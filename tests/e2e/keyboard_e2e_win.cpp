@@ -20,8 +20,8 @@ protected:
         DeleteMachineKey(kLocaleKeyPath);
     }
     void TearDown() override {
-        for (HWND window : TopLevelWindows(launcher.Id(), L"LauncherAppClass")) {
-            PostMessageW(window, WM_CLOSE, 0, 0);
+        for (HWND shown : TopLevelWindows(launcher.Id(), L"LauncherAppClass")) {
+            PostMessageW(shown, WM_CLOSE, 0, 0);
         }
         launcher.WaitForExit(kWindowWaitMs);
         DeleteMachineKey(kLocaleKeyPath);

@@ -109,6 +109,19 @@ LRESULT CALLBACK ParentProc(HWND window, UINT message, WPARAM wParam, LPARAM lPa
     return DefWindowProcW(window, message, wParam, lParam);
 }
 
+BOOL CALLBACK CountWindow(HWND, LPARAM count) {
+    ++*reinterpret_cast<int*>(count);
+    return TRUE;
+}
+
+// A button window's procedure, counting the show messages it gets.
+int showMessages = 0;
+WNDPROC buttonProc = nullptr;
+LRESULT CALLBACK CountingButtonProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message == WM_SHOWWINDOW) ++showMessages;
+    return CallWindowProcW(buttonProc, window, message, wParam, lParam);
+}
+
 class MenuTest : public testing::Test {
 protected:
     void SetUp() override {
@@ -160,9 +173,7 @@ protected:
     }
     int ChildWindows() {
         int count = 0;
-        EnumChildWindows(
-            parent, [](HWND, LPARAM n) { return ++*reinterpret_cast<int*>(n), TRUE; },
-            reinterpret_cast<LPARAM>(&count));
+        EnumChildWindows(parent, CountWindow, reinterpret_cast<LPARAM>(&count));
         return count;
     }
     // The state a paint leaves: the working copy holds the pristine background.
@@ -175,14 +186,8 @@ protected:
 
 TEST_F(MenuTest, ShowCallsShowWindowOnlyOnAChangeAndSetWantedSaysWhetherItChanged) {
     LauncherButton button(parent, 0, 601, 0, 10, 10, 209, 49, false, kActiveLanguage);
-    static int showMessages = 0;
-    static WNDPROC original = nullptr;
-    original = reinterpret_cast<WNDPROC>(SetWindowLongPtrW(
-        button.window, GWLP_WNDPROC,
-        reinterpret_cast<LONG_PTR>(+[](HWND w, UINT m, WPARAM wp, LPARAM lp) -> LRESULT {
-            if (m == WM_SHOWWINDOW) ++showMessages;
-            return CallWindowProcW(original, w, m, wp, lp);
-        })));
+    buttonProc = reinterpret_cast<WNDPROC>(SetWindowLongPtrW(
+        button.window, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(CountingButtonProc)));
     showMessages = 0;
     button.Show(true);
     button.Show(true);
@@ -607,7 +612,9 @@ TEST_F(MenuTest, TheGameCountsAsInstalledWithItsValuesAndAProgramThatOpens) {
         }
         menu->CheckInstallation();
         EXPECT_EQ(menu->installed, row.installed);
-        if (row.installed) EXPECT_EQ(menu->installPath, folder);
+        if (row.installed) {
+            EXPECT_EQ(menu->installPath, folder);
+        }
     }
 }
 
