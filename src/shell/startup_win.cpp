@@ -100,16 +100,17 @@ int RunMessageLoop() {
     }
 }
 
-void ShutDown(UniqueHandle& mutex, HINSTANCE instance) {
+}  // namespace
+
+void ShutDownLauncher(UniqueHandle& mutex, HINSTANCE instance) {
     launcher.menu.DestroyAllButtons();
     ReleaseCatalogue();
     SetMouseHook(instance, launcher.mainWindow, false);
     if (launcher.mainWindow) DestroyWindow(launcher.mainWindow);
-    ReleaseMutex(mutex.Get());
+    launcher.mainWindow = nullptr;
+    if (mutex) ReleaseMutex(mutex.Get());
     mutex.Reset();
 }
-
-}  // namespace
 
 void FindDiscRoot(const wchar_t* invokedAs) {
     std::optional<std::wstring> folder;
@@ -149,7 +150,7 @@ int RunLauncher(HINSTANCE instance, HINSTANCE previous, const wchar_t* commandLi
 
     if (launcher.backgroundWidth == 0) {
         ReportNotOnDisc();
-        ShutDown(mutex, instance);
+        ShutDownLauncher(mutex, instance);
         return 0;
     }
 
@@ -169,6 +170,6 @@ int RunLauncher(HINSTANCE instance, HINSTANCE previous, const wchar_t* commandLi
     SetMouseHook(instance, launcher.mainWindow, true);
 
     int exitCode = RunMessageLoop();
-    ShutDown(mutex, instance);
+    ShutDownLauncher(mutex, instance);
     return exitCode;
 }

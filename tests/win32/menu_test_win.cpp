@@ -504,10 +504,13 @@ TEST_F(MenuTest, ALanguageButtonHidesTheListBuildsTheMenuInThatLanguageOnceAndWr
     EXPECT_TRUE(Ids(LanguagePage, true).empty());
     EXPECT_EQ(Button(101) ? Button(101)->label : L"", L"Installieren");
     wchar_t locale[16] = {};
-    DWORD bytes = sizeof(locale);
-    EXPECT_EQ(RegGetValueW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, nullptr, RRF_RT_REG_SZ, nullptr,
-                           locale, &bytes),
+    HKEY key = nullptr;
+    ASSERT_EQ(RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ | kProductRegistryView,
+                            &key),
               ERROR_SUCCESS);
+    DWORD bytes = sizeof(locale) - sizeof(wchar_t);
+    RegQueryValueExW(key, nullptr, nullptr, nullptr, reinterpret_cast<BYTE*>(locale), &bytes);
+    RegCloseKey(key);
     EXPECT_STREQ(locale, L"de");
     const std::size_t buttons = menu->allButtons.size();
     menu->OnCommand(501);  // the choice is made once

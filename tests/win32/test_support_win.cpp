@@ -133,6 +133,18 @@ void ResetLauncherConfiguration() {
     launcher.instance = GetModuleHandleW(nullptr);
 }
 
+void ResetLauncherMenu() {
+    MenuController& menu = launcher.menu;
+    menu.DestroyAllButtons();
+    menu.installed = false;
+    menu.mainMenuBuilt = false;
+    menu.panelOpen = false;
+    menu.installIndex = menu.playIndex = menu.gamesIndex = menu.infoIndex = -1;
+    menu.lastPanel = 0;
+    launcher.appActive = true;
+    launcher.buttonsRefreshed = false;
+}
+
 bool RunningOnWine() {
     HMODULE ntdll = GetModuleHandleW(L"ntdll.dll");
     return ntdll && GetProcAddress(ntdll, "wine_get_version") != nullptr;

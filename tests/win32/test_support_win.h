@@ -63,6 +63,8 @@ void RemoveTree(const std::wstring& folder);
 
 // Puts the launcher's configuration fields back to their start values.
 void ResetLauncherConfiguration();
+// Destroys the menu's buttons and puts its fields back to their start values.
+void ResetLauncherMenu();
 
 struct Rgb {
     std::uint8_t r, g, b;
