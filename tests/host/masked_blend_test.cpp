@@ -254,3 +254,38 @@ TEST(MaskedBlend, MatchesThePlainRuleOnRandomPictures) {
 }
 
 }  // namespace
+
+namespace {
+
+TEST(MaskedRestore, PutsTheSourceBackWhereverTheMaskTouchedAndClipsLikeTheBlend) {
+    for (std::uint16_t bits : {8, 24}) {
+        SCOPED_TRACE(bits);
+        DibPtr pristine = Filled(6, 4, bits, 200);
+        DibPtr working = Filled(6, 4, bits, 50);
+        DibPtr mask = Filled(4, 4, 8, 0);
+        View m(mask.get());
+        *m.At(0, 0) = 1;  // the faintest edge of a face counts too
+        *m.At(1, 0) = 128;
+        *m.At(2, 0) = 255;
+        *m.At(3, 3) = 9;
+        MaskedRestore(pristine.get(), {2, 0}, mask.get(), {0, 0}, working.get(), {2, 0}, {4, 4});
+        View w(working.get());
+        for (std::int32_t y = 0; y < 4; ++y) {
+            for (std::int32_t x = 0; x < 6; ++x) {
+                bool touched = x >= 2 && *m.At(x - 2, y) != 0;
+                SCOPED_TRACE(testing::Message() << x << "," << y);
+                EXPECT_EQ(*w.At(x, y), touched ? 200 : 50);
+            }
+        }
+        // A rectangle running off D stops at its edge; a depth that differs does nothing.
+        MaskedRestore(pristine.get(), {0, 0}, Filled(4, 4, 8, 255).get(), {0, 0}, working.get(),
+                      {4, 2}, {4, 4});
+        EXPECT_EQ(*w.At(5, 3), 200);
+        DibPtr other = Filled(6, 4, bits == 8 ? 24 : 8, 10);
+        MaskedRestore(other.get(), {0, 0}, Filled(4, 4, 8, 255).get(), {0, 0}, working.get(),
+                      {0, 0}, {4, 4});
+        EXPECT_EQ(*w.At(0, 0), 50);
+    }
+}
+
+}  // namespace
