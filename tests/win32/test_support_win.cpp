@@ -12,6 +12,16 @@ void DeleteMachineKey(const wchar_t* path) {
     if (result == ERROR_SUCCESS) RegDeleteKeyW(HKEY_LOCAL_MACHINE, path);
 }
 
+std::optional<std::wstring> MachineText(const wchar_t* path, const wchar_t* name) {
+    wchar_t text[512] = {};
+    DWORD bytes = sizeof(text);
+    if (RegGetValueW(HKEY_LOCAL_MACHINE, path, name, RRF_RT_REG_SZ, nullptr, text, &bytes) !=
+        ERROR_SUCCESS) {
+        return std::nullopt;
+    }
+    return std::wstring(text);
+}
+
 ScopedMachineKey::ScopedMachineKey(const wchar_t* path) : path_(path) {
     LONG result = RegCreateKeyExW(HKEY_LOCAL_MACHINE, path, 0, nullptr, 0, KEY_ALL_ACCESS, nullptr,
                                   &key_, nullptr);

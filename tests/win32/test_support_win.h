@@ -6,6 +6,7 @@
 #include <windows.h>
 
 #include <cstdint>
+#include <optional>
 #include <ostream>
 #include <string>
 
@@ -13,6 +14,10 @@
 
 // Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine.
 void DeleteMachineKey(const wchar_t* path);
+
+// A REG_SZ value of an HKEY_LOCAL_MACHINE key (empty name: the default value), also when it
+// was stored without its terminator; nothing when the key or value is missing.
+std::optional<std::wstring> MachineText(const wchar_t* path, const wchar_t* name);
 
 // An HKEY_LOCAL_MACHINE key created for one test and deleted with everything below it when
 // the test ends.
