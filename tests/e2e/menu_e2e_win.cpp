@@ -407,7 +407,7 @@ TEST_F(Menu, EachEditionOffersItsLanguagesOrSettlesOne) {
         {4, std::nullopt, nullptr},
         {5, MainMenu{kJapanese, true, true, false}, L"menu-ja"},
         {6, std::nullopt, nullptr},
-        {0, MainMenu{kUsEnglish, true, false, false}, L"menu-en"},
+        {0, MainMenu{kUsEnglish, true, false, false}, nullptr},
         {7, MainMenu{kUsEnglish, true, false, false}, nullptr},
     };
     for (const Row& row : rows) {
@@ -451,7 +451,7 @@ TEST_F(Menu, AClickOnALanguageShowsItsMainMenuAndWritesItsLocale) {
     };
     const Row rows[] = {
         {2, 502, kGerman, L"de", L"menu-de"},  // edition 2: no More Games, no games panel
-        {3, 511, kThai, L"th", L"menu-th"},
+        {3, 511, kThai, L"th", nullptr},
         {6, 514, kNorwegian, L"no", nullptr},
         {1, 506, kSpanish, L"es", nullptr},
     };
