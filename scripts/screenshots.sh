@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
-# Takes the README's screenshots: runs the end-to-end screen tests of a build with the
-# launcher on its sample disc under Wine, and turns the screens they save into PNG files.
+# Takes the README's screenshots: runs the end-to-end tests of a build that save screens (each
+# language's background, the language lists, the main menus, the panels, a hovered button) with
+# the launcher on its sample disc under Wine, and turns the screens into PNG files.
 #   screenshots.sh BUILD_DIR [OUT_DIR]
 set -euo pipefail
 build=$(cd "$1" && pwd)
@@ -13,7 +14,7 @@ mkdir -p "$shots" "$out"
 "$here/tests/wine/prefix.sh" setup "$STATE" >/dev/null
 trap '"$here/tests/wine/prefix.sh" cleanup "$STATE" >/dev/null 2>&1 || true' EXIT
 AUTOPLAY_SCREENSHOT_DIR="Z:${shots//\//\\}" "$here/tests/wine/run.sh" "$STATE" \
-    "$build/bin/e2e_tests.exe" --gtest_filter='Screens.*' | grep -E '^\[ *(OK|FAILED|PASSED) '
+    "$build/bin/e2e_tests.exe" --gtest_filter='Screens.*:Menu.Each*:Menu.AClick*:Menu.TheMouse*' | grep -E '^\[ *(OK|FAILED|PASSED) '
 for shot in "$shots"/*.bmp; do
     convert "$shot" -strip "$out/$(basename "${shot%.bmp}").png"
 done

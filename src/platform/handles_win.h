@@ -5,28 +5,44 @@
 
 #include <windows.h>
 
+#include <atomic>
 #include <utility>
+
+// GDI objects and device contexts that an owner below took and no owner has deleted yet,
+// process-wide. Wine's GetGuiResources answers 0, so this is how a leak in the drawing paths
+// shows from outside (the main window reports it).
+inline std::atomic<long> gdiHandlesHeld{0};
 
 template <typename Handle, typename Traits>
 class UniqueResource {
 public:
     UniqueResource() = default;
-    explicit UniqueResource(Handle handle) : handle_(handle) {}
+    explicit UniqueResource(Handle handle) { Reset(handle); }
     ~UniqueResource() { Reset(); }
     UniqueResource(const UniqueResource&) = delete;
     UniqueResource& operator=(const UniqueResource&) = delete;
-    UniqueResource(UniqueResource&& other) noexcept : handle_(other.Release()) {}
+    UniqueResource(UniqueResource&& other) noexcept
+        : handle_(std::exchange(other.handle_, Traits::Empty())) {}
     UniqueResource& operator=(UniqueResource&& other) noexcept {
-        if (this != &other) Reset(other.Release());
+        if (this != &other) {
+            Reset();
+            handle_ = std::exchange(other.handle_, Traits::Empty());
+        }
         return *this;
     }
 
     Handle Get() const { return handle_; }
     explicit operator bool() const { return !Traits::IsEmpty(handle_); }
+    // A released GDI handle stays counted until an owner deletes it: one that nobody deletes
+    // is a leak, and the count should show it.
     Handle Release() { return std::exchange(handle_, Traits::Empty()); }
     void Reset(Handle handle = Traits::Empty()) {
         Handle old = std::exchange(handle_, handle);
-        if (!Traits::IsEmpty(old)) Traits::Close(old);
+        if (!Traits::IsEmpty(handle)) Traits::Held(+1);
+        if (!Traits::IsEmpty(old)) {
+            Traits::Close(old);
+            Traits::Held(-1);
+        }
     }
 
 private:
@@ -37,6 +53,7 @@ struct KernelHandleTraits {
     static HANDLE Empty() { return nullptr; }
     static bool IsEmpty(HANDLE h) { return h == nullptr || h == INVALID_HANDLE_VALUE; }
     static void Close(HANDLE h) { CloseHandle(h); }
+    static void Held(int) {}
 };
 using UniqueHandle = UniqueResource<HANDLE, KernelHandleTraits>;
 
@@ -44,6 +61,7 @@ struct RegistryKeyTraits {
     static HKEY Empty() { return nullptr; }
     static bool IsEmpty(HKEY key) { return key == nullptr; }
     static void Close(HKEY key) { RegCloseKey(key); }
+    static void Held(int) {}
 };
 using RegistryKey = UniqueResource<HKEY, RegistryKeyTraits>;
 
@@ -52,6 +70,7 @@ struct GdiObjectTraits {
     static Object Empty() { return nullptr; }
     static bool IsEmpty(Object object) { return object == nullptr; }
     static void Close(Object object) { DeleteObject(object); }
+    static void Held(int change) { gdiHandlesHeld += change; }
 };
 template <typename Object>
 using UniqueGdi = UniqueResource<Object, GdiObjectTraits<Object>>;
@@ -61,15 +80,20 @@ struct MemoryDcTraits {
     static HDC Empty() { return nullptr; }
     static bool IsEmpty(HDC dc) { return dc == nullptr; }
     static void Close(HDC dc) { DeleteDC(dc); }
+    static void Held(int change) { gdiHandlesHeld += change; }
 };
 using MemoryDc = UniqueResource<HDC, MemoryDcTraits>;
 
 // The device context of a window (null: the whole screen), released when it goes.
 class WindowDc {
 public:
-    explicit WindowDc(HWND window) : window_(window), dc_(GetDC(window)) {}
+    explicit WindowDc(HWND window) : window_(window), dc_(GetDC(window)) {
+        if (dc_) ++gdiHandlesHeld;
+    }
     ~WindowDc() {
-        if (dc_) ReleaseDC(window_, dc_);
+        if (!dc_) return;
+        ReleaseDC(window_, dc_);
+        --gdiHandlesHeld;
     }
     WindowDc(const WindowDc&) = delete;
     WindowDc& operator=(const WindowDc&) = delete;

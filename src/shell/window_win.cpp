@@ -44,6 +44,27 @@ void DrawLauncherButton(std::uint32_t id, const DRAWITEMSTRUCT& item) {
     launcher.menu.DrawButton(item.hDC, id, item.itemState);
 }
 
+BOOL CALLBACK CountWindow(HWND, LPARAM count) {
+    ++*reinterpret_cast<LRESULT*>(count);
+    return TRUE;
+}
+
+BOOL CALLBACK CountWindowAndDescendants(HWND window, LPARAM count) {
+    CountWindow(window, count);
+    EnumChildWindows(window, CountWindow, count);
+    return TRUE;
+}
+
+LRESULT GuiObjectCount(WPARAM what) {
+    if (what == kGdiHandlesHeld) return gdiHandlesHeld;
+    LRESULT windows = 0;
+    if (what == kWindowsHeld) {
+        EnumThreadWindows(GetCurrentThreadId(), CountWindowAndDescendants,
+                          reinterpret_cast<LPARAM>(&windows));
+    }
+    return windows;
+}
+
 LRESULT HandleMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
 }  // namespace
@@ -123,8 +144,11 @@ LRESULT HandleMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
             ShowWindow(launcher.mainWindow, SW_SHOWNORMAL);
             SetForegroundWindow(launcher.mainWindow);
             return 0;
-        default:
+        default: {
+            static const UINT guiObjectCounts = RegisterWindowMessageW(kGuiObjectCountsMessageName);
+            if (message == guiObjectCounts) return GuiObjectCount(wParam);
             return DefWindowProcW(window, message, wParam, lParam);
+        }
     }
 }
 

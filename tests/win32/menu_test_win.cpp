@@ -503,15 +503,7 @@ TEST_F(MenuTest, ALanguageButtonHidesTheListBuildsTheMenuInThatLanguageOnceAndWr
     EXPECT_EQ(launcher.languageBase, kGerman);
     EXPECT_TRUE(Ids(LanguagePage, true).empty());
     EXPECT_EQ(Button(101) ? Button(101)->label : L"", L"Installieren");
-    wchar_t locale[16] = {};
-    HKEY key = nullptr;
-    ASSERT_EQ(RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ | kProductRegistryView,
-                            &key),
-              ERROR_SUCCESS);
-    DWORD bytes = sizeof(locale) - sizeof(wchar_t);
-    RegQueryValueExW(key, nullptr, nullptr, nullptr, reinterpret_cast<BYTE*>(locale), &bytes);
-    RegCloseKey(key);
-    EXPECT_STREQ(locale, L"de");
+    EXPECT_EQ(MachineText(kLocaleKeyPath, L""), std::optional<std::wstring>(L"de"));
     const std::size_t buttons = menu->allButtons.size();
     menu->OnCommand(501);  // the choice is made once
     EXPECT_EQ(launcher.languageBase, kGerman);
@@ -538,9 +530,15 @@ TEST_F(MenuTest, DestroyingAllButtonsTwiceLeavesNothing) {
 }
 
 TEST_F(MenuTest, AScreenBuiltWhileMemoryRunsOutKeepsWhatItBuiltAndLeaksNothing) {
+    {
+        // Whatever the process sets up once, it sets up here, outside the counted runs.
+        MenuController warmUp;
+        warmUp.StartMainMenu(parent);
+    }
     bool completed = false;
     for (long allowed = 0; !completed && allowed < 2000; ++allowed) {
-        long before = liveAllocations;
+        SCOPED_TRACE(allowed);
+        const long before = liveAllocations;
         int windows = 0;
         std::size_t registered = 0;
         bool consistent = true;
@@ -553,16 +551,17 @@ TEST_F(MenuTest, AScreenBuiltWhileMemoryRunsOutKeepsWhatItBuiltAndLeaksNothing) 
             registered = partial.allButtons.size();
             windows = ChildWindows();
             for (const auto& button : partial.allButtons) {
-                consistent &= IsWindow(button->window) && partial.ButtonForWindow(button->window) == button.get();
+                consistent &= IsWindow(button->window) &&
+                              partial.ButtonForWindow(button->window) == button.get();
             }
             std::size_t inPages = 0;
             for (const auto& page : partial.pages) inPages += page.size();
             consistent &= inPages == registered && partial.buttonsByWindow.size() == registered;
         }
-        SCOPED_TRACE(allowed);
+        const long leaked = liveAllocations - before;
         EXPECT_TRUE(consistent);
         EXPECT_EQ(windows, static_cast<int>(registered)) << "a window without its button";
-        EXPECT_EQ(liveAllocations, before) << "memory left behind";
+        EXPECT_EQ(leaked, 0) << "memory left behind";
         EXPECT_EQ(ChildWindows(), 0);
     }
     EXPECT_TRUE(completed);

@@ -18,6 +18,19 @@ void DeleteMachineKey(const wchar_t* path, REGSAM view) {
     RegDeleteKeyExW(HKEY_LOCAL_MACHINE, path, view, 0);
 }
 
+std::optional<std::wstring> MachineText(const wchar_t* path, const wchar_t* name, REGSAM view) {
+    HKEY key = nullptr;
+    if (RegOpenKeyExW(HKEY_LOCAL_MACHINE, path, 0, KEY_READ | view, &key) != ERROR_SUCCESS) {
+        return std::nullopt;
+    }
+    wchar_t text[512] = {};
+    DWORD bytes = sizeof(text);
+    LONG result = RegGetValueW(key, nullptr, name, RRF_RT_REG_SZ, nullptr, text, &bytes);
+    RegCloseKey(key);
+    if (result != ERROR_SUCCESS) return std::nullopt;
+    return std::wstring(text);
+}
+
 ScopedMachineKey::ScopedMachineKey(const wchar_t* path, REGSAM view) : path_(path), view_(view) {
     LONG result = RegCreateKeyExW(HKEY_LOCAL_MACHINE, path, 0, nullptr, 0, KEY_ALL_ACCESS | view,
                                   nullptr, &key_, nullptr);

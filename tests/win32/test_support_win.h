@@ -6,6 +6,7 @@
 #include <windows.h>
 
 #include <cstdint>
+#include <optional>
 #include <ostream>
 #include <string>
 
@@ -15,6 +16,11 @@
 // Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine. Keys are
 // in the product's registry view (the 32-bit one) unless a test asks for the other.
 void DeleteMachineKey(const wchar_t* path, REGSAM view = kProductRegistryView);
+
+// A REG_SZ value of an HKEY_LOCAL_MACHINE key (empty name: the default value), also when it
+// was stored without its terminator; nothing when the key or value is missing.
+std::optional<std::wstring> MachineText(const wchar_t* path, const wchar_t* name,
+                                        REGSAM view = kProductRegistryView);
 
 // An HKEY_LOCAL_MACHINE key created for one test and deleted with everything below it when
 // the test ends.
