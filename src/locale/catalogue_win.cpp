@@ -68,16 +68,17 @@ void CreateFonts() {
     }
 }
 
-// Two pictures are interchangeable as backgrounds when a byte-for-byte copy of one over the
-// other is a whole picture again.
-bool SameShape(const DibBitmap* a, const DibBitmap* b) {
-    std::int32_t wa = 0, ha = 0, wb = 0, hb = 0;
+// Each paint copies a background byte for byte over the working copy, so every background
+// must be a block of the one shape the language-selection picture has: 640 × 480, 24-bit.
+bool FitsBackgroundShape(const DibBitmap* picture) {
+    std::int32_t width = 0, height = 0;
     const std::uint8_t* pixels = nullptr;
     std::uint32_t stride = 0;
-    std::uint16_t depthA = 0, depthB = 0;
-    return DibDimensions(a, wa, ha) && DibDimensions(b, wb, hb) && wa == wb && ha == hb &&
-           DibRowInfo(a, pixels, stride, depthA) && DibRowInfo(b, pixels, stride, depthB) &&
-           depthA == depthB && DibBlockSize(a) == DibBlockSize(b);
+    std::uint16_t depth = 0;
+    return DibDimensions(picture, width, height) && width == kBackgroundShape.width &&
+           height == kBackgroundShape.height && DibRowInfo(picture, pixels, stride, depth) &&
+           depth == kBackgroundShape.bitCount &&
+           DibBlockSize(picture) == kDibInfoHeaderSize + std::size_t{stride} * height;
 }
 
 }  // namespace
@@ -110,22 +111,17 @@ bool LoadBackgrounds() {
             LoadPictureFile(path.c_str(), kLoadFilePicture));
     }
 
-    // The first language background sets the size of the window and of the working copy;
-    // one that does not match it could not be copied over the working copy, so it counts
-    // as missing.
+    // A disc file of another shape counts as missing, and so would a language-selection
+    // picture that is not what the program was built with; the size never comes from a file.
     DibBitmap* first = nullptr;
     catalogue.firstBackgroundKey = -1;
-    for (const LanguageInfo& language : Languages()) {
-        DibPtr& entry = backgrounds[static_cast<std::int32_t>(language.base)];
-        if (!entry) continue;
-        if (!first) {
+    for (auto& [key, entry] : backgrounds) {
+        if (entry && !FitsBackgroundShape(entry.get())) entry.reset();
+        if (entry && key != 0 && !first) {
             first = entry.get();
-            catalogue.firstBackgroundKey = static_cast<std::int32_t>(language.base);
-        } else if (!SameShape(entry.get(), first)) {
-            entry.reset();
+            catalogue.firstBackgroundKey = key;
         }
     }
-    if (first && backgrounds[0] && !SameShape(backgrounds[0].get(), first)) backgrounds[0].reset();
 
     launcher.workingBackground.reset(CloneDib(first));
     std::int32_t width = 0;

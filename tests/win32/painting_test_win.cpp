@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "graphics/dib.h"
+#include "graphics/masked_blend.h"
 #include "graphics/painting_win.h"
 #include "graphics/picture_win.h"
 #include "locale/catalogue_win.h"
@@ -14,6 +15,29 @@
 #include "test_support_win.h"
 
 namespace {
+
+// An 8-bit grey .bmp file, every pixel black.
+std::string GreyBmpFile(int width, int height) {
+    const std::uint32_t stride = (static_cast<std::uint32_t>(width) + 3) & ~3u;
+    const std::uint32_t offset = 14 + 40 + 1024;
+    std::string file(offset + stride * static_cast<std::uint32_t>(height), '\0');
+    auto put32 = [&](std::size_t at, std::uint32_t v) { std::memcpy(&file[at], &v, 4); };
+    file[0] = 'B';
+    file[1] = 'M';
+    put32(2, static_cast<std::uint32_t>(file.size()));
+    put32(10, offset);
+    put32(14, 40);
+    put32(18, static_cast<std::uint32_t>(width));
+    put32(22, static_cast<std::uint32_t>(height));
+    file[26] = 1;
+    file[28] = 8;
+    for (std::size_t level = 0; level < 256; ++level) {
+        for (std::size_t channel = 0; channel < 3; ++channel) {
+            file[54 + level * 4 + channel] = static_cast<char>(level);
+        }
+    }
+    return file;
+}
 
 // A 32-bit top-down memory surface the window is painted into.
 class Surface {
@@ -74,7 +98,7 @@ TEST_F(Painting, NoBackgroundOnTheDiscMeansNoWindowSize) {
     EXPECT_EQ(launcher.workingBackground, nullptr);
 }
 
-TEST_F(Painting, FirstLanguageBackgroundSetsTheSize) {
+TEST_F(Painting, WorkingCopyComesFromTheFirstLanguageBackground) {
     WriteBackground(kGerman);
     WriteBackground(kJapanese);
     LoadBackgrounds();
@@ -89,7 +113,7 @@ TEST_F(Painting, FirstLanguageBackgroundSetsTheSize) {
 
 TEST_F(Painting, CorruptOrMismatchedBackgroundsCountAsMissing) {
     WriteBackground(kUsEnglish);
-    WriteBackground(kFrench, 320, 240);  // another size than the first
+    WriteBackground(kFrench, 320, 240);  // not the window's size
     std::string truncated = SolidBmpFile(640, 480, TestColorOf(kGerman));
     truncated.resize(1000);
     disc.WriteFile(FindLanguage(kGerman)->backgroundFile, truncated);
@@ -104,6 +128,48 @@ TEST_F(Painting, CorruptOrMismatchedBackgroundsCountAsMissing) {
     for (LanguageBase base : {kFrench, kGerman, kSpanish, kItalian}) {
         SCOPED_TRACE(base);
         EXPECT_EQ(BackgroundFor(base), nullptr);
+    }
+}
+
+// The window's size and every background's shape come from the program's own 640 × 480 24-bit
+// picture, never from whichever disc file happens to load first.
+TEST_F(Painting, OffShapeFirstBackgroundIsTheOneThatCountsAsMissing) {
+    struct Row {
+        const char* name;
+        std::string file;
+    };
+    const Row rows[] = {
+        {"320 x 240", SolidBmpFile(320, 240, TestColorOf(kUsEnglish))},
+        {"8-bit", GreyBmpFile(640, 480)},
+    };
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.name);
+        WriteAllBackgrounds();
+        disc.WriteFile(FindLanguage(kUsEnglish)->backgroundFile, row.file);
+        LoadBackgrounds();
+        EXPECT_EQ(launcher.backgroundWidth, 640);
+        EXPECT_EQ(launcher.backgroundHeight, 480);
+        EXPECT_EQ(BackgroundFor(kUsEnglish), nullptr);
+        EXPECT_NE(BackgroundFor(0), nullptr) << "the language-selection picture was dropped";
+        for (LanguageBase base : {kFrench, kJapanese, kDanish}) {
+            SCOPED_TRACE(base);
+            EXPECT_NE(BackgroundFor(base), nullptr);
+        }
+        // Compositing into the working copy needs its 24 bits.
+        DibPtr white(CreateDib(10, 10, 24));
+        DibPtr opaque(CreateDib(10, 10, 8));
+        std::uint8_t* rows8 = nullptr;
+        std::uint32_t stride = 0;
+        std::uint16_t depth = 0;
+        ASSERT_TRUE(DibRowInfo(white.get(), rows8, stride, depth));
+        std::memset(rows8, 255, stride * 10);
+        ASSERT_TRUE(DibRowInfo(opaque.get(), rows8, stride, depth));
+        std::memset(rows8, 255, stride * 10);
+        MaskedBlend(white.get(), {0, 0}, launcher.workingBackground.get(), {0, 0}, opaque.get(),
+                    {0, 0}, launcher.workingBackground.get(), {0, 0}, {10, 10});
+        ASSERT_TRUE(DibRowInfo(launcher.workingBackground.get(), rows8, stride, depth));
+        EXPECT_EQ(rows8[stride * 479], 255) << "the blend left the working copy alone";
+        ReleaseCatalogue();
     }
 }
 
