@@ -298,6 +298,53 @@ TEST_F(Painting, CaptionsAreRightAlignedAtTheirPoints) {
     EXPECT_EQ(FindInk(surface, 223, 235, background).count, 0);
 }
 
+// The window's DC is a class DC that keeps its state between paints, and the catalogue
+// deletes its fonts at shutdown: a paint must hand the DC back as it found it.
+TEST_F(Painting, PaintingLeavesTheDcAsItFoundIt) {
+    WriteAllBackgrounds();
+    LoadCatalogue();
+    launcher.languageBase = kUsEnglish;
+    launcher.languageKnown = true;
+    Surface surface(640, 480);
+    HDC dc = surface.Dc();
+    UniqueGdi<HFONT> ownFont(CreateFontW(-20, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE,
+                                         DEFAULT_CHARSET, 0, 0, 0, 0, L"Arial"));
+    HGDIOBJ originalFont = SelectObject(dc, ownFont.Get());
+    SetTextColor(dc, RGB(1, 2, 3));
+    SetBkMode(dc, OPAQUE);
+    // Isotropic at one to one draws as MM_TEXT does, so only the mode itself can differ.
+    SetMapMode(dc, MM_ISOTROPIC);
+    struct DcState {
+        HGDIOBJ font, palette;
+        COLORREF textColor;
+        int backgroundMode, mapMode;
+    };
+    auto stateOf = [dc] {
+        return DcState{GetCurrentObject(dc, OBJ_FONT), GetCurrentObject(dc, OBJ_PAL),
+                       GetTextColor(dc), GetBkMode(dc), GetMapMode(dc)};
+    };
+    const DcState before = stateOf();
+    struct Row {
+        const char* name;
+        void (*paint)(HDC);
+    };
+    const Row rows[] = {
+        {"window paint", [](HDC target) { PaintLauncherWindow(target); }},
+        {"one caption", [](HDC target) { DrawCaption(target, 10, 398, 443); }},
+    };
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.name);
+        row.paint(dc);
+        DcState after = stateOf();
+        EXPECT_EQ(after.font, before.font);
+        EXPECT_EQ(after.palette, before.palette);
+        EXPECT_EQ(after.textColor, before.textColor);
+        EXPECT_EQ(after.backgroundMode, before.backgroundMode);
+        EXPECT_EQ(after.mapMode, before.mapMode);
+    }
+    SelectObject(dc, originalFont);
+}
+
 TEST_F(Painting, EditionTwoHasNoMoreGamesCaption) {
     WriteAllBackgrounds();
     LoadCatalogue();
