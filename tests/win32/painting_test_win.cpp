@@ -181,20 +181,26 @@ TEST_F(Painting, ShowsTheActiveLanguagesBackgroundOrTheLanguageList) {
         SCOPED_TRACE(base);
         launcher.languageBase = base;
         launcher.languageKnown = true;
+        launcher.buttonsRefreshed = true;
         PaintLauncherWindow(surface.Dc());
         EXPECT_EQ(surface.At(5, 5), TestColorOf(base));
         EXPECT_EQ(surface.At(639, 479), TestColorOf(base));
-        EXPECT_FALSE(launcher.buttonsRefreshed);
+        EXPECT_FALSE(launcher.buttonsRefreshed) << "the buttons are not asked to draw again";
     }
     launcher.languageBase = kNoLanguage;
     launcher.languageKnown = false;
     PaintLauncherWindow(surface.Dc());
+    // The program's own language-selection picture, pixel for pixel.
     const DibBitmap* list = BackgroundFor(0);
-    if (list) {
-        // The language-selection picture is the program's own: it is not any language's colour.
-        EXPECT_FALSE(surface.At(5, 5) == TestColorOf(kUsEnglish));
-    } else {
-        EXPECT_EQ(surface.At(5, 5), TestColorOf(kUsEnglish)) << "no list picture: the first one shows";
+    ASSERT_NE(list, nullptr);
+    const std::uint8_t* rows = nullptr;
+    std::uint32_t stride = 0;
+    std::uint16_t depth = 0;
+    ASSERT_TRUE(DibRowInfo(list, rows, stride, depth));
+    for (POINT at : {POINT{5, 5}, POINT{320, 240}, POINT{639, 479}}) {
+        SCOPED_TRACE(testing::Message() << at.x << "," << at.y);
+        const std::uint8_t* pixel = rows + (479 - at.y) * stride + at.x * 3;
+        EXPECT_EQ(surface.At(at.x, at.y), (Rgb{pixel[2], pixel[1], pixel[0]}));
     }
 }
 
@@ -248,11 +254,22 @@ TEST_F(Painting, OpenPanelIsCompositedAtItsPlaceThroughTheOpaqueMask) {
     EXPECT_EQ(surface.At(500, 100), under);
 }
 
-// The caption pixels (dark blue text on the green test background) in a band of rows.
+// The caption colour as this display shows it: exact on true colour, else the palette's nearest.
+Rgb CaptionColorShown() {
+    if (!launcher.palette) return {0, 0, 140};
+    PALETTEENTRY entry{};
+    GetPaletteEntries(launcher.palette.Get(),
+                      GetNearestPaletteIndex(launcher.palette.Get(), RGB(0, 0, 140)), 1, &entry);
+    return {entry.peRed, entry.peGreen, entry.peBlue};
+}
+
+// The caption pixels (dark blue text on the green test background) in a band of rows; the
+// core is the pixels the glyphs cover fully, which show the caption colour itself.
 struct Ink {
-    int left = 10000, right = -1, count = 0;
+    int left = 10000, right = -1, count = 0, core = 0;
 };
 Ink FindInk(const Surface& surface, int top, int bottom, Rgb background) {
+    const Rgb caption = CaptionColorShown();
     Ink ink;
     for (int y = top; y <= bottom; ++y) {
         for (int x = 0; x < 640; ++x) {
@@ -265,12 +282,13 @@ Ink FindInk(const Surface& surface, int top, int bottom, Rgb background) {
                 ink.right = std::max(ink.right, x);
                 ++ink.count;
             }
+            if (c == caption) ++ink.core;
         }
     }
     return ink;
 }
 
-TEST_F(Painting, CaptionsAreRightAlignedAtTheirPoints) {
+TEST_F(Painting, CaptionsAreRightAlignedAtTheirPointsInTheCaptionColour) {
     WriteAllBackgrounds();
     LoadCatalogue();
     launcher.languageBase = kUsEnglish;
@@ -285,6 +303,7 @@ TEST_F(Painting, CaptionsAreRightAlignedAtTheirPoints) {
         SCOPED_TRACE(row.right);
         Ink ink = FindInk(surface, row.bottom - 14, row.bottom - 2, background);
         ASSERT_GT(ink.count, 20) << "no caption text there";
+        EXPECT_GE(ink.core, 5) << "the text is not drawn in the caption colour";
         EXPECT_LE(ink.right, row.right);
         // Side bearings of the last glyph leave a few pixels free; a left-aligned or misplaced
         // caption would end far from the point.
