@@ -132,25 +132,40 @@ bool LoadBackgrounds() {
     return ApplyLauncherPalette(first);
 }
 
-void LoadCatalogue() {
+namespace {
+
+void MakeLauncherPalette() {
     launcher.palette.Reset(CreateLauncherPalette());
+}
+
+void AddPrivateFont() {
     catalogue.fontFileAdded += AddFontResourceW(kPrivateFontFile);
     // Broadcasts can stall on a hung window; the font is usable by the launcher either way.
     SendMessageTimeoutW(HWND_BROADCAST, WM_FONTCHANGE, 0, 0, SMTO_ABORTIFHUNG, 1000, nullptr);
-    CreateFonts();
-    LoadBackgrounds();
+}
 
+void LoadBackgroundPictures() {
+    LoadBackgrounds();
+}
+
+void LoadPlates() {
     for (std::int32_t key = 0; key < kPlateKeys; ++key) {
         for (int state = 0; state < kPlateStates; ++state) {
             catalogue.buttonPlates[state][key].reset(
                 LoadPictureResource(kPlateResources[key][state], kLoadResourcePicture));
         }
     }
+}
+
+void LoadPanels() {
     catalogue.opaqueMask.reset(LoadPictureResource(kOpaqueMaskId, kLoadResourcePicture));
     for (int panel : {1, 2, 0}) {
         catalogue.panelPictures[panel].reset(
             LoadPictureResource(kPanelResources[panel].id, kLoadResourcePicture));
     }
+}
+
+void LoadIcons() {
     for (std::int32_t key : kIconLoadOrder) {
         const IconResources& resources = kIconResources[key];
         for (int state = 0; state < kIconStates; ++state) {
@@ -164,19 +179,48 @@ void LoadCatalogue() {
                 LoadPictureResource(resources.mask[state], kLoadResourcePicture));
         }
     }
-    // The language list's About button gets pictures of its own, so no picture has two owners.
+}
+
+// The language list's About button gets pictures of its own, so no picture has two owners.
+void CloneListAboutPictures() {
     for (int state = 0; state < kPlateStates; ++state) {
         catalogue.iconPictures[state][kListAboutIconKey].reset(
             CloneDib(IconPictureFor(state, kAboutIconKey)));
     }
     for (int state = 0; state < kPlateStates; ++state) {
-        catalogue.iconMasks[state][kListAboutIconKey].reset(CloneDib(IconMaskFor(state, kAboutIconKey)));
+        catalogue.iconMasks[state][kListAboutIconKey].reset(
+            CloneDib(IconMaskFor(state, kAboutIconKey)));
     }
+}
+
+void ApplyPaletteToPanelPlates() {
     for (std::int32_t key = 0; key < kPalettedPlates; ++key) {
         for (int state = 0; state < kPlateStates; ++state) {
             if (DibBitmap* plate = PlateFor(state, key)) ApplyLauncherPalette(plate);
         }
     }
+}
+
+constexpr std::array<CatalogueStep, kCatalogueStepCount> kSteps = {{
+    {"palette", MakeLauncherPalette},
+    {"private font", AddPrivateFont},
+    {"fonts", CreateFonts},
+    {"backgrounds", LoadBackgroundPictures},
+    {"plates", LoadPlates},
+    {"panels and mask", LoadPanels},
+    {"icons and masks", LoadIcons},
+    {"clones", CloneListAboutPictures},
+    {"plate colours", ApplyPaletteToPanelPlates},
+}};
+
+}  // namespace
+
+const std::array<CatalogueStep, kCatalogueStepCount>& CatalogueSteps() {
+    return kSteps;
+}
+
+void LoadCatalogue() {
+    for (const CatalogueStep& step : kSteps) step.run();
 }
 
 void ReleaseCatalogue() {
