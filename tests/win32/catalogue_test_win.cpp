@@ -10,6 +10,7 @@
 #include "graphics/dib.h"
 #include "graphics/picture_win.h"
 #include "locale/catalogue_win.h"
+#include "locale/picture_ids.h"
 #include "shell/launcher_state.h"
 #include "test_support_win.h"
 
@@ -223,6 +224,36 @@ TEST_F(Catalogue, ReleaseLeavesNothingBehind) {
     EXPECT_EQ(IconPictureFor(0, 0), nullptr);
     EXPECT_EQ(BackgroundFor(kUsEnglish), nullptr);
     EXPECT_EQ(launcher.workingBackground, nullptr);
+}
+
+// Every picture the catalogue loads from the program, made straight from the resource's bytes,
+// is byte for byte what LoadImage and DibFromBitmap make of it. The launcher takes the short
+// way only on displays of more than 8 bits, where no palette comes between.
+TEST_F(Catalogue, PicturesFromResourceBytesEqualTheGdiRoundTrip) {
+    std::set<WORD> ids = {kLanguageListBackgroundId, kOpaqueMaskId};
+    for (const auto& plates : kPlateResources) ids.insert(std::begin(plates), std::end(plates));
+    for (const IconResources& icon : kIconResources) {
+        for (int state = 0; state < kIconStates; ++state) {
+            if (icon.picture[state]) ids.insert(icon.picture[state]);
+            if (icon.mask[state]) ids.insert(icon.mask[state]);
+        }
+    }
+    for (const PanelResource& panel : kPanelResources) ids.insert(panel.id);
+    ASSERT_GT(ids.size(), 130u);
+
+    bool palette = launcher.palette.Get() != nullptr;
+    for (WORD id : ids) {
+        SCOPED_TRACE(id);
+        DibPtr direct(PictureFromResourceBytes(id));
+        DibPtr gdi(LoadPictureResourceThroughGdi(id, kLoadResourcePicture));
+        DibPtr loaded(LoadPictureResource(id, kLoadResourcePicture));
+        ASSERT_TRUE(direct && gdi && loaded);
+        ASSERT_TRUE(DibIsConsistent(direct.get()));
+        EXPECT_TRUE(SameBlock(loaded.get(), gdi.get()));
+        if (!palette) {
+            EXPECT_TRUE(SameBlock(direct.get(), gdi.get()));
+        }
+    }
 }
 
 // On displays of more than 8 bits per pixel there is no palette and no picture changes.

@@ -2,6 +2,8 @@
 #include <gtest/gtest.h>
 
 #include <cstring>
+#include <fstream>
+#include <iterator>
 #include <string>
 #include <vector>
 
@@ -362,6 +364,67 @@ TEST_F(Painting, PaintingLeavesTheDcAsItFoundIt) {
         EXPECT_EQ(after.mapMode, before.mapMode);
     }
     SelectObject(dc, originalFont);
+}
+
+// Every background of the sample disc, made straight from the file's checked bytes, is byte
+// for byte what LoadImage and DibFromBitmap make of the file.
+TEST_F(Painting, DiscBackgroundsFromFileBytesEqualTheGdiRoundTrip) {
+    const std::wstring built = TestProgramFolder() + L"..\\disc\\";
+    bool palette = launcher.palette.Get() != nullptr;
+    for (const LanguageInfo& language : Languages()) {
+        SCOPED_TRACE(language.base);
+        std::wstring path = built + language.backgroundFile;
+        DibPtr loaded(LoadPictureFile(path.c_str(), kLoadFilePicture));
+        DibPtr gdi(LoadPictureFileThroughGdi(path.c_str(), kLoadFilePicture));
+        ASSERT_TRUE(loaded && gdi) << "the sample disc has not been built";
+        EXPECT_TRUE(SameBlock(loaded.get(), gdi.get()));
+        if (palette) continue;
+        // On this display the launcher reads the file's bytes once and never asks GDI.
+        std::ifstream in(path.c_str(), std::ios::binary);
+        std::string file((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
+        ASSERT_GT(file.size(), 54u);
+        std::uint32_t pixelOffset = 0;
+        std::memcpy(&pixelOffset, &file[10], 4);
+        DibPtr direct(DibFromStoredPicture(reinterpret_cast<const std::uint8_t*>(file.data()) + 14,
+                                           file.size() - 14, pixelOffset - 14));
+        EXPECT_TRUE(SameBlock(direct.get(), gdi.get()));
+    }
+}
+
+// What the direct read cannot make exactly still loads, through LoadImage and DibFromBitmap.
+TEST_F(Painting, FilesTheDirectReadCannotMakeGoThroughGdi) {
+    struct Row {
+        const char* name;
+        std::string file;
+    };
+    // Rows stored top-down, the first one red and the others blue.
+    std::string topDown = SolidBmpFile(8, 4, Rgb{0, 0, 255});
+    std::int32_t negativeHeight = -4;
+    std::memcpy(&topDown[22], &negativeHeight, 4);
+    for (std::size_t x = 0; x < 8; ++x) {
+        topDown[54 + x * 3] = 0;
+        topDown[54 + x * 3 + 2] = static_cast<char>(255);
+    }
+    std::string shortTable = GreyBmpFile(8, 4);
+    std::uint32_t sixteenColours = 16;
+    std::memcpy(&shortTable[46], &sixteenColours, 4);
+    std::string v5Header = SolidBmpFile(8, 4, Rgb{10, 20, 30});
+    v5Header.insert(54, 84, '\0');
+    std::uint32_t v5 = 124, offset = 14 + 124, size = static_cast<std::uint32_t>(v5Header.size());
+    std::memcpy(&v5Header[14], &v5, 4);
+    std::memcpy(&v5Header[10], &offset, 4);
+    std::memcpy(&v5Header[2], &size, 4);
+    const Row rows[] = {{"top-down rows", topDown},
+                        {"16-entry colour table", shortTable},
+                        {"version 5 header", v5Header}};
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.name);
+        std::wstring path = disc.WriteFile(L"picture.bmp", row.file);
+        DibPtr loaded(LoadPictureFile(path.c_str(), kLoadFilePicture));
+        DibPtr gdi(LoadPictureFileThroughGdi(path.c_str(), kLoadFilePicture));
+        ASSERT_TRUE(loaded && gdi);
+        EXPECT_TRUE(SameBlock(loaded.get(), gdi.get()));
+    }
 }
 
 TEST_F(Painting, EditionTwoHasNoMoreGamesCaption) {
