@@ -140,8 +140,9 @@ void MakeLauncherPalette() {
 
 void AddPrivateFont() {
     catalogue.fontFileAdded += AddFontResourceW(kPrivateFontFile);
-    // Broadcasts can stall on a hung window; the font is usable by the launcher either way.
-    SendMessageTimeoutW(HWND_BROADCAST, WM_FONTCHANGE, 0, 0, SMTO_ABORTIFHUNG, 1000, nullptr);
+    // Other programs need only hear of the change, and the launcher needs nothing back from
+    // them: a notification does not keep start-up waiting on every window of the desktop.
+    SendNotifyMessageW(HWND_BROADCAST, WM_FONTCHANGE, 0, 0);
 }
 
 void LoadBackgroundPictures() {
