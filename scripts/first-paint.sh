@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
 # Time from process start to the first painted frame under Wine: the launcher on the sample
-# disc against an empty window program, started the same way in the same run.
+# disc against an empty window program, started the same way in the same run; then where the
+# launcher's start-up time goes, phase by phase.
 #   first-paint.sh BUILD_DIR [RUNS]
 set -euo pipefail
 build=$(cd "$1" && pwd)
@@ -10,4 +11,6 @@ STATE="$build/first-paint-wine"
 trap '"$here/tests/wine/prefix.sh" cleanup "$STATE" >/dev/null 2>&1 || true' EXIT
 disc="$build/disc"
 "$here/tests/wine/run.sh" "$STATE" "$build/bin/first_paint.exe" "Z:${disc//\//\\}" "${2:-7}" |
+    grep -v '^ALSA'
+"$here/tests/wine/run.sh" "$STATE" "$build/bin/startup_phases.exe" "Z:${disc//\//\\}" "${2:-7}" |
     grep -v '^ALSA'

@@ -7,6 +7,8 @@ namespace {
 
 constexpr std::size_t kFileHeaderSize = 14;
 constexpr std::uint32_t kCoreHeaderSize = 12;
+// Of the larger info headers only the fields of the 40-byte one are read.
+constexpr std::size_t kInfoFieldsRead = 40;
 // Pictures larger than this on either side are not launcher pictures.
 constexpr std::int64_t kLargestSide = 16384;
 // Leaves room for a file header in front within the 32-bit sizes of bitmap files.
@@ -27,7 +29,13 @@ std::uint16_t Read16(const std::uint8_t* at) {
 }  // namespace
 
 bool BmpFileIsWhole(const std::uint8_t* data, std::size_t size) {
-    if (data == nullptr || size < kFileHeaderSize + kCoreHeaderSize) return false;
+    return BmpFileIsWhole(data, size, size);
+}
+
+bool BmpFileIsWhole(const std::uint8_t* data, std::size_t available, std::uint64_t size) {
+    if (data == nullptr || available > size || available < kFileHeaderSize + kCoreHeaderSize) {
+        return false;
+    }
     if (data[0] != 'B' || data[1] != 'M') return false;
     const std::uint64_t pixelOffset = Read32(data + 10);
     const std::uint8_t* info = data + kFileHeaderSize;
@@ -50,6 +58,7 @@ bool BmpFileIsWhole(const std::uint8_t* data, std::size_t size) {
     } else if (headerSize == 40 || headerSize == 52 || headerSize == 56 || headerSize == 108 ||
                headerSize == 124) {
         if (size < kFileHeaderSize + headerSize) return false;
+        if (available < kFileHeaderSize + kInfoFieldsRead) return false;
         width = static_cast<std::int32_t>(Read32(info + 4));
         height = static_cast<std::int32_t>(Read32(info + 8));
         planes = Read16(info + 12);

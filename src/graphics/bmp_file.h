@@ -14,6 +14,10 @@
 // colour table and every pixel row (or the compressed image it names) lie inside the file,
 // and width, height and depth are those of a real picture.
 bool BmpFileIsWhole(const std::uint8_t* data, std::size_t size);
+// The same judgement from the start of a file of `fileSize` bytes: `available` bytes from
+// `head` on, at least the file header and the first 40 bytes of the info header (or the whole
+// file, when it is shorter).
+bool BmpFileIsWhole(const std::uint8_t* head, std::size_t available, std::uint64_t fileSize);
 
 // What a checked picture holds, for the disc check to say what is wrong with a picture that
 // the launcher would refuse or misdraw. The height keeps its sign (negative: top-down rows).

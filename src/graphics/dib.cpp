@@ -178,6 +178,73 @@ DibBitmap* CreateDib(std::int32_t width, std::int32_t height, std::uint16_t bitC
     return picture;
 }
 
+std::optional<StoredPictureLayout> StoredPictureLayoutOf(const std::uint8_t* info,
+                                                         std::size_t available, std::size_t size,
+                                                         std::size_t pixelOffset) {
+    constexpr std::uint32_t kFullTable = 256;
+    constexpr std::size_t kFullTableBytes = kFullTable * 4;
+    if (info == nullptr || available > size || available < kDibInfoHeaderSize) return std::nullopt;
+    DibHeaderFields fields = DibReadHeader(info);
+    if (fields.headerSize != kDibInfoHeaderSize || fields.compression != kDibRgb ||
+        ReadU16(info, 12) != 1 || fields.width <= 0 || fields.height <= 0) {
+        return std::nullopt;
+    }
+    StoredPictureLayout layout{};
+    if (fields.bitCount == 8) {
+        // GetDIBits hands back the section's table at full length; a shorter one would leave
+        // entries this cannot know.
+        if (fields.colorsUsed != 0 && fields.colorsUsed != kFullTable) return std::nullopt;
+        layout.tableBytes = kFullTableBytes;
+        if (available < kDibInfoHeaderSize + kFullTableBytes) return std::nullopt;
+        for (std::size_t entry = 0; entry < kFullTable; ++entry) {
+            if (info[kDibInfoHeaderSize + entry * 4 + 3] != 0) return std::nullopt;
+        }
+    } else if (fields.bitCount != 24 || fields.colorsUsed != 0) {
+        return std::nullopt;
+    }
+    std::uint64_t stride = DibRowStride(fields.width, fields.bitCount);
+    std::uint64_t rowBytes = stride * static_cast<std::uint64_t>(fields.height);
+    // The stride keeps 16 bits of the row length, so a very wide row would wrap.
+    if (stride < (static_cast<std::uint64_t>(fields.width) * fields.bitCount + 7) / 8 ||
+        pixelOffset < kDibInfoHeaderSize + layout.tableBytes || pixelOffset > size ||
+        rowBytes > size - pixelOffset ||
+        rowBytes > kMaxBlockSize - kDibInfoHeaderSize - layout.tableBytes) {
+        return std::nullopt;
+    }
+    layout.pixelOffset = pixelOffset;
+    layout.rowBytes = static_cast<std::size_t>(rowBytes);
+    return layout;
+}
+
+DibBitmap* DibForStoredPicture(const std::uint8_t* info, const StoredPictureLayout& layout) {
+    DibBitmap* picture = DibAlloc(0, kDibInfoHeaderSize + layout.tableBytes + layout.rowBytes);
+    if (picture == nullptr) return nullptr;
+    // GetDIBits fills in the image size and leaves the fields it was given as zero.
+    DibHeaderFields fields = DibReadHeader(info);
+    std::uint8_t* bytes = Bytes(picture);
+    std::memset(bytes, 0, kDibInfoHeaderSize);
+    WriteU32(bytes, 0, kDibInfoHeaderSize);
+    WriteU32(bytes, 4, static_cast<std::uint32_t>(fields.width));
+    WriteU32(bytes, 8, static_cast<std::uint32_t>(fields.height));
+    WriteU16(bytes, 12, 1);
+    WriteU16(bytes, 14, fields.bitCount);
+    WriteU32(bytes, 20, static_cast<std::uint32_t>(layout.rowBytes));
+    std::memcpy(bytes + kDibInfoHeaderSize, info + kDibInfoHeaderSize, layout.tableBytes);
+    return picture;
+}
+
+DibBitmap* DibFromStoredPicture(const std::uint8_t* info, std::size_t size,
+                                std::size_t pixelOffset) {
+    std::optional<StoredPictureLayout> layout =
+        StoredPictureLayoutOf(info, size, size, pixelOffset);
+    if (!layout) return nullptr;
+    DibBitmap* picture = DibForStoredPicture(info, *layout);
+    if (picture == nullptr) return nullptr;
+    std::memcpy(Bytes(picture) + kDibInfoHeaderSize + layout->tableBytes, info + pixelOffset,
+                layout->rowBytes);
+    return picture;
+}
+
 DibBitmap* CloneDib(const DibBitmap* picture) {
     if (picture == nullptr) return nullptr;
     std::size_t size = DibBlockSize(picture);

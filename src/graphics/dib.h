@@ -7,6 +7,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <optional>
 
 // Never defined: a DibBitmap* points at the first byte of the block. Null means no picture.
 struct DibBitmap;
@@ -58,6 +59,31 @@ bool DibIsConsistent(const DibBitmap* picture);
 // A 40-byte-header picture with zeroed pixels; depths of 8 bits or fewer get a grey ramp as
 // colour table (256 levels at 8 bits). Null for a size or depth that cannot be a picture.
 DibBitmap* CreateDib(std::int32_t width, std::int32_t height, std::uint16_t bitCount);
+
+// The block a stored picture becomes when the system loads it into a DIB section and it is
+// read back at its own depth (DibFromBitmap), made straight from the stored bytes: the header
+// rewritten as GetDIBits writes it, the colour table and the rows copied. `info` is the
+// picture's info header (a bitmap resource, or a bitmap file after its 14-byte file header),
+// `size` bytes are readable from it and the rows start `pixelOffset` bytes after it.
+// Null for what this cannot make exactly that way: any header but the 40-byte one, any
+// compression, top-down rows, depths other than 8 and 24 bits, a colour table other than 256
+// plain entries at 8 bits or any at 24, and rows that are not all there.
+DibBitmap* DibFromStoredPicture(const std::uint8_t* info, std::size_t size,
+                                std::size_t pixelOffset);
+
+// The same in two steps, for rows that are read straight into the block: where they go, then
+// a block with its header and colour table written and its rows left to the caller. Only the
+// header and the colour table need be among the `available` bytes from `info` on; `size` is
+// the length of the whole stored picture.
+struct StoredPictureLayout {
+    std::size_t tableBytes;
+    std::size_t pixelOffset;  // of the stored rows, from `info`
+    std::size_t rowBytes;     // which end the block
+};
+std::optional<StoredPictureLayout> StoredPictureLayoutOf(const std::uint8_t* info,
+                                                         std::size_t available, std::size_t size,
+                                                         std::size_t pixelOffset);
+DibBitmap* DibForStoredPicture(const std::uint8_t* info, const StoredPictureLayout& layout);
 
 // A new block with the same bytes; null for null or when memory runs out.
 DibBitmap* CloneDib(const DibBitmap* picture);

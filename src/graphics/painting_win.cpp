@@ -27,6 +27,7 @@ const DibBitmap* ShownBackground() {
 }
 
 void PaintLauncherWindow(HDC dc) {
+    DcStateGuard state(dc);
     PaletteGuard palette(dc, launcher.palette.Get());
     launcher.backgroundBitmap.Reset();
     DibBitmap* working = launcher.workingBackground.get();
@@ -58,6 +59,8 @@ void DrawCaption(HDC dc, std::uint32_t stringOffset, int right, int bottom) {
     wchar_t text[kCaptionTextCapacity];
     int length = LoadLocalString(launcher.languageBase, stringOffset, text, kCaptionTextCapacity);
     HFONT font = FontFor(launcher.languageBase);
+    // The caption is measured in the window's DC with its font; the DC gets back what it had.
+    DcStateGuard state(dc);
     PrepareTextDc(dc, font);
     SIZE extent{};
     GetTextExtentPoint32W(dc, text, length, &extent);

@@ -2,6 +2,7 @@
 
 #include <cstdlib>
 #include <cstring>
+#include <optional>
 #include <vector>
 
 #include "graphics/bmp_file.h"
@@ -123,40 +124,99 @@ DibBitmap* PictureFromLoadedImage(HANDLE image) {
     return picture;
 }
 
+// Whether LoadImage into a DIB section and GetDIBits give back a picture's stored bytes:
+// only when no palette stands between them, on displays of more than 8 bits per pixel.
+// The display's depth does not change while the launcher loads its pictures.
+bool StoredBytesSurviveGdi(UINT flags) {
+    static const bool deepDisplay = [] {
+        WindowDc screen(nullptr);
+        return screen.Get() && GetDeviceCaps(screen.Get(), BITSPIXEL) > 8;
+    }();
+    return deepDisplay && (flags & ~static_cast<UINT>(LR_LOADFROMFILE)) == LR_CREATEDIBSECTION;
+}
+
+constexpr DWORD kLargestPictureFile = 64 * 1024 * 1024;
+constexpr std::size_t kBmpFileHeaderSize = 14;
+// The file header, an info header and an 8-bit colour table: all the check and the start of
+// a block need; the rows are read straight into the block.
+constexpr std::size_t kBmpHeadSize = kBmpFileHeaderSize + kDibInfoHeaderSize + 256 * 4;
+
+bool ReadExactly(HANDLE file, void* into, std::size_t size) {
+    DWORD read = 0;
+    return ReadFile(file, into, static_cast<DWORD>(size), &read, nullptr) && read == size;
+}
+
 }  // namespace
 
-DibBitmap* LoadPictureResource(WORD id, UINT flags) {
+DibBitmap* LoadPictureResourceThroughGdi(WORD id, UINT flags) {
     return PictureFromLoadedImage(
         LoadImageW(launcher.instance, MAKEINTRESOURCEW(id), IMAGE_BITMAP, 0, 0, flags));
 }
 
-namespace {
-
-constexpr DWORD kLargestPictureFile = 64 * 1024 * 1024;
-
-// The system's loader trusts the file's header; a truncated or corrupt file from the disc
-// is looked at first and counts as missing.
-bool PictureFileIsWhole(const wchar_t* path) {
-    UniqueHandle file(CreateFileW(path, GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING,
-                                  FILE_ATTRIBUTE_NORMAL, nullptr));
-    if (!file) return false;
-    LARGE_INTEGER size{};
-    if (!GetFileSizeEx(file.Get(), &size) || size.QuadPart > kLargestPictureFile) return false;
-    std::vector<std::uint8_t> bytes(static_cast<std::size_t>(size.QuadPart));
-    DWORD read = 0;
-    if (!bytes.empty() &&
-        (!ReadFile(file.Get(), bytes.data(), static_cast<DWORD>(bytes.size()), &read, nullptr) ||
-         read != bytes.size())) {
-        return false;
-    }
-    return BmpFileIsWhole(bytes.data(), bytes.size());
+DibBitmap* PictureFromResourceBytes(WORD id) {
+    HRSRC found = FindResourceW(launcher.instance, MAKEINTRESOURCEW(id), RT_BITMAP);
+    if (!found) return nullptr;
+    HGLOBAL loaded = LoadResource(launcher.instance, found);
+    const auto* bytes = static_cast<const std::uint8_t*>(loaded ? LockResource(loaded) : nullptr);
+    DWORD size = SizeofResource(launcher.instance, found);
+    if (!bytes || size < kDibInfoHeaderSize) return nullptr;
+    // In a packed DIB the rows follow the colour table.
+    return DibFromStoredPicture(bytes, size, kDibInfoHeaderSize + DibColorTableSize(bytes));
 }
 
-}  // namespace
+DibBitmap* LoadPictureResource(WORD id, UINT flags) {
+    if (StoredBytesSurviveGdi(flags)) {
+        if (DibBitmap* picture = PictureFromResourceBytes(id)) return picture;
+    }
+    return LoadPictureResourceThroughGdi(id, flags);
+}
 
-DibBitmap* LoadPictureFile(const wchar_t* path, UINT flags) {
-    if (!PictureFileIsWhole(path)) return nullptr;
+DibBitmap* LoadPictureFileThroughGdi(const wchar_t* path, UINT flags) {
     return PictureFromLoadedImage(LoadImageW(nullptr, path, IMAGE_BITMAP, 0, 0, flags));
+}
+
+// The system's loader trusts the file's header, so a file from the disc is looked at first: a
+// truncated or corrupt one counts as missing. Where the stored bytes are the picture, the rows
+// go from the file straight into the picture's block and the file is read only once.
+DibBitmap* LoadPictureFile(const wchar_t* path, UINT flags) {
+    UniqueHandle file(CreateFileW(path, GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING,
+                                  FILE_ATTRIBUTE_NORMAL | FILE_FLAG_SEQUENTIAL_SCAN, nullptr));
+    if (!file) return nullptr;
+    LARGE_INTEGER fileSize{};
+    if (!GetFileSizeEx(file.Get(), &fileSize) || fileSize.QuadPart > kLargestPictureFile) {
+        return nullptr;
+    }
+    const auto size = static_cast<std::size_t>(fileSize.QuadPart);
+    std::uint8_t head[kBmpHeadSize];
+    const std::size_t headSize = size < kBmpHeadSize ? size : kBmpHeadSize;
+    if (!ReadExactly(file.Get(), head, headSize) || !BmpFileIsWhole(head, headSize, size)) {
+        return nullptr;
+    }
+    if (StoredBytesSurviveGdi(flags)) {
+        std::uint32_t pixelOffset = 0;
+        std::memcpy(&pixelOffset, head + 10, sizeof(pixelOffset));
+        // The check has made sure the rows start after the headers and end inside the file.
+        std::optional<StoredPictureLayout> layout =
+            StoredPictureLayoutOf(head + kBmpFileHeaderSize, headSize - kBmpFileHeaderSize,
+                                  size - kBmpFileHeaderSize, pixelOffset - kBmpFileHeaderSize);
+        if (layout) {
+            DibPtr picture(DibForStoredPicture(head + kBmpFileHeaderSize, *layout));
+            LARGE_INTEGER rows{};
+            rows.QuadPart = pixelOffset;
+            if (!picture || !SetFilePointerEx(file.Get(), rows, nullptr, FILE_BEGIN)) {
+                return nullptr;
+            }
+            auto* block = reinterpret_cast<std::uint8_t*>(picture.get());
+            // Whole a moment ago and unreadable now is as good as missing.
+            if (!ReadExactly(file.Get(), block + DibBlockSize(picture.get()) - layout->rowBytes,
+                             layout->rowBytes)) {
+                return nullptr;
+            }
+            return picture.release();
+        }
+    }
+    file.Reset();
+    return LoadPictureFileThroughGdi(path, flags);
 }
 
 bool LoadPaletteResource(WORD id, LOGPALETTE* palette) {

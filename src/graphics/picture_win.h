@@ -25,9 +25,20 @@ HBITMAP BitmapFromDib(const DibBitmap* picture, HPALETTE palette);
 int StretchDibBlt(HDC dc, int x, int y, int width, int height, const DibBitmap* picture,
                   int sourceX, int sourceY, int sourceWidth, int sourceHeight, DWORD rop);
 
+// A picture of the program's resources or of a bitmap file on the disc, as LoadImage with
+// `flags` and DibFromBitmap through the launcher's palette make it. On displays of more than
+// 8 bits per pixel that round trip gives back the picture's stored bytes, so a DIB-section
+// load of a picture DibFromStoredPicture can read is made straight from those bytes instead.
 DibBitmap* LoadPictureResource(WORD id, UINT flags);
 // Null for a missing, unreadable or corrupt file.
 DibBitmap* LoadPictureFile(const wchar_t* path, UINT flags);
+
+// The two ways those loads take, for the tests that hold them to the same bytes: always
+// through LoadImage and DibFromBitmap, and straight from the resource's bytes (null when
+// DibFromStoredPicture cannot read them).
+DibBitmap* LoadPictureResourceThroughGdi(WORD id, UINT flags);
+DibBitmap* LoadPictureFileThroughGdi(const wchar_t* path, UINT flags);
+DibBitmap* PictureFromResourceBytes(WORD id);
 
 // The palette for displays of 8 bits per pixel or fewer (also making the palette table);
 // null on deeper displays.

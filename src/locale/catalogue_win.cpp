@@ -68,16 +68,17 @@ void CreateFonts() {
     }
 }
 
-// Two pictures are interchangeable as backgrounds when a byte-for-byte copy of one over the
-// other is a whole picture again.
-bool SameShape(const DibBitmap* a, const DibBitmap* b) {
-    std::int32_t wa = 0, ha = 0, wb = 0, hb = 0;
+// Each paint copies a background byte for byte over the working copy, so every background
+// must be a block of the one shape the language-selection picture has: 640 × 480, 24-bit.
+bool FitsBackgroundShape(const DibBitmap* picture) {
+    std::int32_t width = 0, height = 0;
     const std::uint8_t* pixels = nullptr;
     std::uint32_t stride = 0;
-    std::uint16_t depthA = 0, depthB = 0;
-    return DibDimensions(a, wa, ha) && DibDimensions(b, wb, hb) && wa == wb && ha == hb &&
-           DibRowInfo(a, pixels, stride, depthA) && DibRowInfo(b, pixels, stride, depthB) &&
-           depthA == depthB && DibBlockSize(a) == DibBlockSize(b);
+    std::uint16_t depth = 0;
+    return DibDimensions(picture, width, height) && width == kBackgroundShape.width &&
+           height == kBackgroundShape.height && DibRowInfo(picture, pixels, stride, depth) &&
+           depth == kBackgroundShape.bitCount &&
+           DibBlockSize(picture) == kDibInfoHeaderSize + std::size_t{stride} * height;
 }
 
 }  // namespace
@@ -110,22 +111,17 @@ bool LoadBackgrounds() {
             LoadPictureFile(path.c_str(), kLoadFilePicture));
     }
 
-    // The first language background sets the size of the window and of the working copy;
-    // one that does not match it could not be copied over the working copy, so it counts
-    // as missing.
+    // A disc file of another shape counts as missing, and so would a language-selection
+    // picture that is not what the program was built with; the size never comes from a file.
     DibBitmap* first = nullptr;
     catalogue.firstBackgroundKey = -1;
-    for (const LanguageInfo& language : Languages()) {
-        DibPtr& entry = backgrounds[static_cast<std::int32_t>(language.base)];
-        if (!entry) continue;
-        if (!first) {
+    for (auto& [key, entry] : backgrounds) {
+        if (entry && !FitsBackgroundShape(entry.get())) entry.reset();
+        if (entry && key != 0 && !first) {
             first = entry.get();
-            catalogue.firstBackgroundKey = static_cast<std::int32_t>(language.base);
-        } else if (!SameShape(entry.get(), first)) {
-            entry.reset();
+            catalogue.firstBackgroundKey = key;
         }
     }
-    if (first && backgrounds[0] && !SameShape(backgrounds[0].get(), first)) backgrounds[0].reset();
 
     launcher.workingBackground.reset(CloneDib(first));
     std::int32_t width = 0;
@@ -136,25 +132,41 @@ bool LoadBackgrounds() {
     return ApplyLauncherPalette(first);
 }
 
-void LoadCatalogue() {
-    launcher.palette.Reset(CreateLauncherPalette());
-    catalogue.fontFileAdded += AddFontResourceW(kPrivateFontFile);
-    // Broadcasts can stall on a hung window; the font is usable by the launcher either way.
-    SendMessageTimeoutW(HWND_BROADCAST, WM_FONTCHANGE, 0, 0, SMTO_ABORTIFHUNG, 1000, nullptr);
-    CreateFonts();
-    LoadBackgrounds();
+namespace {
 
+void MakeLauncherPalette() {
+    launcher.palette.Reset(CreateLauncherPalette());
+}
+
+void AddPrivateFont() {
+    catalogue.fontFileAdded += AddFontResourceW(kPrivateFontFile);
+    // Other programs need only hear of the change, and the launcher needs nothing back from
+    // them: a notification does not keep start-up waiting on every window of the desktop.
+    SendNotifyMessageW(HWND_BROADCAST, WM_FONTCHANGE, 0, 0);
+}
+
+void LoadBackgroundPictures() {
+    LoadBackgrounds();
+}
+
+void LoadPlates() {
     for (std::int32_t key = 0; key < kPlateKeys; ++key) {
         for (int state = 0; state < kPlateStates; ++state) {
             catalogue.buttonPlates[state][key].reset(
                 LoadPictureResource(kPlateResources[key][state], kLoadResourcePicture));
         }
     }
+}
+
+void LoadPanels() {
     catalogue.opaqueMask.reset(LoadPictureResource(kOpaqueMaskId, kLoadResourcePicture));
     for (int panel : {1, 2, 0}) {
         catalogue.panelPictures[panel].reset(
             LoadPictureResource(kPanelResources[panel].id, kLoadResourcePicture));
     }
+}
+
+void LoadIcons() {
     for (std::int32_t key : kIconLoadOrder) {
         const IconResources& resources = kIconResources[key];
         for (int state = 0; state < kIconStates; ++state) {
@@ -168,19 +180,48 @@ void LoadCatalogue() {
                 LoadPictureResource(resources.mask[state], kLoadResourcePicture));
         }
     }
-    // The language list's About button gets pictures of its own, so no picture has two owners.
+}
+
+// The language list's About button gets pictures of its own, so no picture has two owners.
+void CloneListAboutPictures() {
     for (int state = 0; state < kPlateStates; ++state) {
         catalogue.iconPictures[state][kListAboutIconKey].reset(
             CloneDib(IconPictureFor(state, kAboutIconKey)));
     }
     for (int state = 0; state < kPlateStates; ++state) {
-        catalogue.iconMasks[state][kListAboutIconKey].reset(CloneDib(IconMaskFor(state, kAboutIconKey)));
+        catalogue.iconMasks[state][kListAboutIconKey].reset(
+            CloneDib(IconMaskFor(state, kAboutIconKey)));
     }
+}
+
+void ApplyPaletteToPanelPlates() {
     for (std::int32_t key = 0; key < kPalettedPlates; ++key) {
         for (int state = 0; state < kPlateStates; ++state) {
             if (DibBitmap* plate = PlateFor(state, key)) ApplyLauncherPalette(plate);
         }
     }
+}
+
+constexpr std::array<CatalogueStep, kCatalogueStepCount> kSteps = {{
+    {"palette", MakeLauncherPalette},
+    {"private font", AddPrivateFont},
+    {"fonts", CreateFonts},
+    {"backgrounds", LoadBackgroundPictures},
+    {"plates", LoadPlates},
+    {"panels and mask", LoadPanels},
+    {"icons and masks", LoadIcons},
+    {"clones", CloneListAboutPictures},
+    {"plate colours", ApplyPaletteToPanelPlates},
+}};
+
+}  // namespace
+
+const std::array<CatalogueStep, kCatalogueStepCount>& CatalogueSteps() {
+    return kSteps;
+}
+
+void LoadCatalogue() {
+    for (const CatalogueStep& step : kSteps) step.run();
 }
 
 void ReleaseCatalogue() {

@@ -140,4 +140,20 @@ private:
     HPALETTE previous_ = nullptr;
 };
 
+// Saves a device context's state (selected objects, colours, modes) and restores it when it
+// goes: a class DC (CS_OWNDC) keeps whatever a paint leaves in it, so nothing stays behind.
+class DcStateGuard {
+  public:
+    explicit DcStateGuard(HDC dc) : dc_(dc), saved_(dc ? SaveDC(dc) : 0) {}
+    ~DcStateGuard() {
+        if (saved_ != 0) RestoreDC(dc_, saved_);
+    }
+    DcStateGuard(const DcStateGuard&) = delete;
+    DcStateGuard& operator=(const DcStateGuard&) = delete;
+
+  private:
+    HDC dc_;
+    int saved_;
+};
+
 #endif

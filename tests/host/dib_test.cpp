@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
 #include <cstring>
 #include <limits>
 #include <vector>
@@ -189,6 +190,104 @@ TEST(DibPictures, BlocksThatDoNotHoldWhatTheirHeaderClaimsAreNoPicture) {
     EXPECT_FALSE(DibDimensions(stub.get(), width, height));
     EXPECT_FALSE(DibDimensions(nullptr, width, height));
     EXPECT_EQ(width, -1);
+}
+
+// A stored picture as a resource or a file carries it: a 40-byte header with the fields a
+// drawing program fills in, a grey table at 8 bits, then rows of distinct bytes.
+struct StoredPicture {
+    std::vector<std::uint8_t> bytes;
+    std::size_t pixelOffset;
+};
+StoredPicture Stored(std::int32_t width, std::int32_t height, std::uint16_t bitCount) {
+    std::size_t table = bitCount == 8 ? 1024 : 0;
+    std::size_t rows = DibRowStride(width, bitCount) * static_cast<std::size_t>(std::abs(height));
+    StoredPicture picture{Header(40, bitCount), 40 + table};
+    picture.bytes.resize(40 + table + rows);
+    Put(picture.bytes.data(), 4, width);
+    Put(picture.bytes.data(), 8, height);
+    Put(picture.bytes.data(), 12, std::uint16_t{1});
+    Put(picture.bytes.data(), 24, std::uint32_t{2835});  // 72 dots per inch
+    Put(picture.bytes.data(), 28, std::uint32_t{2835});
+    for (std::size_t level = 0; level < table / 4; ++level) {
+        std::uint8_t entry[4] = {std::uint8_t(level), std::uint8_t(level), std::uint8_t(level), 0};
+        std::memcpy(&picture.bytes[40 + level * 4], entry, 4);
+    }
+    for (std::size_t i = 0; i < rows; ++i) picture.bytes[40 + table + i] = std::uint8_t(i * 7 + 3);
+    return picture;
+}
+
+DibPtr FromStored(const StoredPicture& picture) {
+    return DibPtr(
+        DibFromStoredPicture(picture.bytes.data(), picture.bytes.size(), picture.pixelOffset));
+}
+
+TEST(DibFromStoredBytes, HeaderAsGetDIBitsWritesItTableAndRowsAsStored) {
+    for (std::uint16_t depth : {8, 24}) {
+        SCOPED_TRACE(depth);
+        StoredPicture stored = Stored(13, 5, depth);
+        DibPtr picture = FromStored(stored);
+        ASSERT_TRUE(picture);
+        ASSERT_TRUE(DibIsConsistent(picture.get()));
+        std::uint32_t table = depth == 8 ? 1024 : 0;
+        std::uint32_t rows = DibRowStride(13, depth) * 5;
+        ASSERT_EQ(DibBlockSize(picture.get()), 40 + table + rows);
+        // Size, width, height, planes and depth; no compression; the image size; and the
+        // resolution and colour counts left at zero.
+        std::vector<std::uint8_t> header = Header(40, depth);
+        Put(header.data(), 4, std::int32_t{13});
+        Put(header.data(), 8, std::int32_t{5});
+        Put(header.data(), 12, std::uint16_t{1});
+        Put(header.data(), 20, rows);
+        EXPECT_EQ(std::memcmp(picture.get(), header.data(), 40), 0);
+        EXPECT_EQ(std::memcmp(Bytes(picture.get()) + 40, stored.bytes.data() + 40, table + rows),
+                  0);
+    }
+}
+
+TEST(DibFromStoredBytes, RowsAreTakenFromTheirOffset) {
+    StoredPicture stored = Stored(4, 2, 24);
+    // A file may leave a gap between the header and its rows.
+    stored.bytes.insert(stored.bytes.begin() + 40, 6, 0xEE);
+    stored.pixelOffset += 6;
+    DibPtr picture = FromStored(stored);
+    ASSERT_TRUE(picture);
+    EXPECT_EQ(std::memcmp(Bytes(picture.get()) + 40, stored.bytes.data() + 46, 24), 0);
+}
+
+// Whatever the round trip through GDI would change, or what is not all there, is left to it.
+TEST(DibFromStoredBytes, NullForWhatOnlyTheRoundTripCanMake) {
+    struct Row {
+        const char* name;
+        void (*change)(StoredPicture&);
+    };
+    const Row rows[] = {
+        {"core header", [](StoredPicture& p) { Put(p.bytes.data(), 0, std::uint32_t{12}); }},
+        {"version 5 header", [](StoredPicture& p) { Put(p.bytes.data(), 0, std::uint32_t{124}); }},
+        {"run-length compression",
+         [](StoredPicture& p) { Put(p.bytes.data(), 16, std::uint32_t{1}); }},
+        {"bit fields", [](StoredPicture& p) { Put(p.bytes.data(), 16, std::uint32_t{3}); }},
+        {"top-down rows", [](StoredPicture& p) { Put(p.bytes.data(), 8, std::int32_t{-5}); }},
+        {"two planes", [](StoredPicture& p) { Put(p.bytes.data(), 12, std::uint16_t{2}); }},
+        {"16 bits", [](StoredPicture& p) { Put(p.bytes.data(), 14, std::uint16_t{16}); }},
+        {"short colour table",
+         [](StoredPicture& p) { Put(p.bytes.data(), 32, std::uint32_t{16}); }},
+        {"table entry with a fourth byte", [](StoredPicture& p) { p.bytes[40 + 4 * 9 + 3] = 1; }},
+        {"last row cut short", [](StoredPicture& p) { p.bytes.pop_back(); }},
+        {"rows past the end", [](StoredPicture& p) { p.pixelOffset += 4; }},
+        {"rows inside the table", [](StoredPicture& p) { p.pixelOffset -= 4; }},
+        {"no width", [](StoredPicture& p) { Put(p.bytes.data(), 4, std::int32_t{0}); }},
+    };
+    ASSERT_TRUE(FromStored(Stored(13, 5, 8)));
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.name);
+        StoredPicture stored = Stored(13, 5, 8);
+        row.change(stored);
+        EXPECT_FALSE(FromStored(stored));
+    }
+    StoredPicture colourTable = Stored(13, 5, 24);
+    Put(colourTable.bytes.data(), 32, std::uint32_t{2});
+    EXPECT_FALSE(FromStored(colourTable)) << "a 24-bit picture with a colour table";
+    EXPECT_FALSE(DibFromStoredPicture(nullptr, 100, 40));
 }
 
 TEST(DibCopies, CloneIsIndependent) {

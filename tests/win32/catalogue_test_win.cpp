@@ -10,6 +10,7 @@
 #include "graphics/dib.h"
 #include "graphics/picture_win.h"
 #include "locale/catalogue_win.h"
+#include "locale/picture_ids.h"
 #include "shell/launcher_state.h"
 #include "test_support_win.h"
 
@@ -44,13 +45,22 @@ protected:
         wcscpy_s(launcher.rootPath, disc.Path().c_str());
         disc.WriteFile(FindLanguage(kUsEnglish)->backgroundFile,
                        SolidBmpFile(640, 480, TestColorOf(kUsEnglish)));
+        // The private font is added by its bare name, found in the current folder as the
+        // launcher finds it on its disc.
+        std::wstring font = disc.MakeFoldersFor(kPrivateFontFile);
+        ASSERT_TRUE(CopyFileW((TestProgramFolder() + L"..\\disc\\" + kPrivateFontFile).c_str(),
+                              font.c_str(), FALSE));
+        GetCurrentDirectoryW(MAX_PATH, savedFolder);
+        SetCurrentDirectoryW(disc.Path().c_str());
         LoadCatalogue();
     }
     void TearDown() override {
         ReleaseCatalogue();
+        SetCurrentDirectoryW(savedFolder);
         launcher.rootPath[0] = L'\0';
     }
     TempFolder disc;
+    wchar_t savedFolder[MAX_PATH] = {};
 };
 
 TEST_F(Catalogue, PlatesHaveTheirSizeInEveryState) {
@@ -128,36 +138,122 @@ TEST_F(Catalogue, PanelsMaskAndLanguageListBackground) {
     }
 }
 
-TEST_F(Catalogue, FontsByLanguage) {
-    for (const LanguageInfo& language : Languages()) {
-        SCOPED_TRACE(language.base);
-        EXPECT_EQ(FontFor(language.base), catalogue.fontSlots[static_cast<int>(language.font)]);
-        EXPECT_NE(FontFor(language.base), nullptr);
+TEST_F(Catalogue, EveryLanguageHasItsFont) {
+    struct Row {
+        LanguageBase base;
+        const wchar_t* face;
+        LONG height;
+        LONG weight;
+        BYTE charset;
+    };
+    const wchar_t* comic = L"Comic Sans MS";
+    const Row rows[] = {
+        {kUsEnglish, comic, -16, 400, 0},
+        {kFrench, comic, -16, 400, 0},
+        {kGerman, comic, -16, 400, 0},
+        {kSwedish, comic, -16, 400, 0},
+        {kDutch, comic, -16, 400, 0},
+        {kPortuguese, comic, -16, 400, 0},
+        {kSpanish, comic, -16, 400, 0},
+        {kItalian, comic, -16, 400, 0},
+        {kPolish, comic, -16, 400, 238},
+        {kJapanese, L"\uFF2D\uFF33 \uFF30\u30B4\u30B7\u30C3\u30AF", -12, 700, 128},
+        {kTraditionalChinese, L"\u65B0\u7D30\u660E\u9AD4", -12, 700, 136},
+        {kSimplifiedChinese, L"\u5B8B\u4F53", -12, 700, 134},
+        {kThai, L"Angsana New [Thai]", -16, 700, 222},
+        {kKorean, L"GulimChe", -12, 700, 129},
+        {kUkEnglish, comic, -16, 400, 0},
+        {kNorwegian, comic, -16, 400, 0},
+        {kFinnish, comic, -16, 400, 0},
+        {kDanish, comic, -16, 400, 0},
+    };
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.base);
+        LOGFONTW font{};
+        ASSERT_EQ(GetObjectW(FontFor(row.base), sizeof(font), &font),
+                  static_cast<int>(sizeof(font)));
+        EXPECT_STREQ(font.lfFaceName, row.face);
+        EXPECT_EQ(font.lfHeight, row.height);
+        EXPECT_EQ(font.lfWeight, row.weight);
+        EXPECT_EQ(font.lfCharSet, row.charset);
+        EXPECT_EQ(font.lfOutPrecision, OUT_TT_PRECIS);
+        EXPECT_EQ(font.lfQuality, ANTIALIASED_QUALITY);
+        EXPECT_FALSE(font.lfItalic || font.lfUnderline || font.lfStrikeOut);
     }
+    // Languages that share a font share one handle, which release deletes once.
+    EXPECT_EQ(FontFor(kUkEnglish), FontFor(kUsEnglish));
     EXPECT_EQ(FontFor(kNoLanguage), nullptr);
     EXPECT_EQ(FontFor(9000), nullptr);
-    EXPECT_NE(FontFor(kPolish), FontFor(kUsEnglish));
-    EXPECT_EQ(FontFor(kUkEnglish), FontFor(kUsEnglish));
-    LOGFONTW polish{};
-    ASSERT_TRUE(GetObjectW(FontFor(kPolish), sizeof(polish), &polish));
-    EXPECT_EQ(polish.lfCharSet, EASTEUROPE_CHARSET);
-    EXPECT_EQ(polish.lfHeight, -16);
-    LOGFONTW japanese{};
-    ASSERT_TRUE(GetObjectW(FontFor(kJapanese), sizeof(japanese), &japanese));
-    EXPECT_EQ(japanese.lfCharSet, SHIFTJIS_CHARSET);
-    EXPECT_EQ(japanese.lfWeight, FW_BOLD);
-    EXPECT_STREQ(japanese.lfFaceName, L"\uFF2D\uFF33 \uFF30\u30B4\u30B7\u30C3\u30AF");
-    EXPECT_NE(catalogue.fontSlots[static_cast<int>(FontSlot::Cyrillic)], nullptr);
+    // The Cyrillic font is made and released, though no language uses it.
+    LOGFONTW cyrillic{};
+    ASSERT_TRUE(GetObjectW(catalogue.fontSlots[static_cast<int>(FontSlot::Cyrillic)],
+                           sizeof(cyrillic), &cyrillic));
+    EXPECT_EQ(cyrillic.lfHeight, -12);
+    EXPECT_EQ(cyrillic.lfWeight, 700);
+    EXPECT_EQ(cyrillic.lfCharSet, RUSSIAN_CHARSET);
+}
+
+int fontChangesSeen = 0;
+
+LRESULT CALLBACK CountFontChanges(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message == WM_FONTCHANGE) ++fontChangesSeen;
+    return DefWindowProcW(window, message, wParam, lParam);
 }
 
 TEST_F(Catalogue, ReleaseLeavesNothingBehind) {
+    // The private font was found (the tests run beside a copy of it), so release has it to
+    // remove. Wine keeps a font that duplicates an installed one out of its list, so the
+    // removal shows only in the change it announces, which a window of this thread receives
+    // before the broadcast returns.
+    ASSERT_GT(catalogue.fontFileAdded, 0);
+    WNDCLASSW windowClass{};
+    windowClass.lpfnWndProc = CountFontChanges;
+    windowClass.hInstance = GetModuleHandleW(nullptr);
+    windowClass.lpszClassName = L"FontChangeCounter";
+    RegisterClassW(&windowClass);
+    HWND listener = CreateWindowExW(0, windowClass.lpszClassName, L"", WS_POPUP, 0, 0, 1, 1,
+                                    nullptr, nullptr, windowClass.hInstance, nullptr);
+    ASSERT_TRUE(listener);
+    fontChangesSeen = 0;
     ReleaseCatalogue();
+    DestroyWindow(listener);
+    EXPECT_EQ(fontChangesSeen, 1);
+    EXPECT_EQ(catalogue.fontFileAdded, 0);
     EXPECT_EQ(FontFor(kUsEnglish), nullptr);
     EXPECT_EQ(PlateFor(0, 0), nullptr);
     EXPECT_EQ(IconPictureFor(0, 0), nullptr);
     EXPECT_EQ(BackgroundFor(kUsEnglish), nullptr);
     EXPECT_EQ(launcher.workingBackground, nullptr);
-    EXPECT_EQ(catalogue.fontFileAdded, 0);
+}
+
+// Every picture the catalogue loads from the program, made straight from the resource's bytes,
+// is byte for byte what LoadImage and DibFromBitmap make of it. The launcher takes the short
+// way only on displays of more than 8 bits, where no palette comes between.
+TEST_F(Catalogue, PicturesFromResourceBytesEqualTheGdiRoundTrip) {
+    std::set<WORD> ids = {kLanguageListBackgroundId, kOpaqueMaskId};
+    for (const auto& plates : kPlateResources) ids.insert(std::begin(plates), std::end(plates));
+    for (const IconResources& icon : kIconResources) {
+        for (int state = 0; state < kIconStates; ++state) {
+            if (icon.picture[state]) ids.insert(icon.picture[state]);
+            if (icon.mask[state]) ids.insert(icon.mask[state]);
+        }
+    }
+    for (const PanelResource& panel : kPanelResources) ids.insert(panel.id);
+    ASSERT_GT(ids.size(), 130u);
+
+    bool palette = launcher.palette.Get() != nullptr;
+    for (WORD id : ids) {
+        SCOPED_TRACE(id);
+        DibPtr direct(PictureFromResourceBytes(id));
+        DibPtr gdi(LoadPictureResourceThroughGdi(id, kLoadResourcePicture));
+        DibPtr loaded(LoadPictureResource(id, kLoadResourcePicture));
+        ASSERT_TRUE(direct && gdi && loaded);
+        ASSERT_TRUE(DibIsConsistent(direct.get()));
+        EXPECT_TRUE(SameBlock(loaded.get(), gdi.get()));
+        if (!palette) {
+            EXPECT_TRUE(SameBlock(direct.get(), gdi.get()));
+        }
+    }
 }
 
 // On displays of more than 8 bits per pixel there is no palette and no picture changes.

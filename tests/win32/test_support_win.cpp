@@ -220,3 +220,20 @@ BITMAPINFO TopDownInfo(int width, int height) {
     info.bmiHeader.biBitCount = 32;
     return info;
 }
+
+testing::AssertionResult SameBlock(const DibBitmap* a, const DibBitmap* b) {
+    if (!a || !b) return testing::AssertionFailure() << "a picture is missing";
+    if (DibBlockSize(a) != DibBlockSize(b)) {
+        return testing::AssertionFailure()
+               << "blocks of " << DibBlockSize(a) << " and " << DibBlockSize(b) << " bytes";
+    }
+    const auto* x = reinterpret_cast<const std::uint8_t*>(a);
+    const auto* y = reinterpret_cast<const std::uint8_t*>(b);
+    for (std::size_t at = 0; at < DibBlockSize(a); ++at) {
+        if (x[at] != y[at]) {
+            return testing::AssertionFailure() << "first difference at byte " << at << ": "
+                                               << int{x[at]} << " against " << int{y[at]};
+        }
+    }
+    return testing::AssertionSuccess();
+}

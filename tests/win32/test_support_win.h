@@ -3,6 +3,7 @@
 #ifndef AUTOPLAY_TESTS_TEST_SUPPORT_WIN_H
 #define AUTOPLAY_TESTS_TEST_SUPPORT_WIN_H
 
+#include <gtest/gtest.h>
 #include <windows.h>
 
 #include <cstdint>
@@ -87,6 +88,10 @@ Rgb TestColorOf(LanguageBase base);
 Rgb ScreenPixel(int x, int y);
 // The header of a 32-bit top-down picture, the layout tests read pixels in.
 BITMAPINFO TopDownInfo(int width, int height);
+
+struct DibBitmap;
+// Success when both blocks have the same length and bytes; otherwise says where they part.
+testing::AssertionResult SameBlock(const DibBitmap* a, const DibBitmap* b);
 
 // Wine behaves differently from Windows in a few documented details.
 bool RunningOnWine();
