@@ -23,8 +23,9 @@ namespace {
 
 using LogLine = std::vector<std::wstring>;
 
-// The windows of the programs the commands start; each is closed before the next click, so
-// that none lies over the launcher's buttons.
+// The windows of the programs the commands start. Each test closes them before its next
+// click, so that none lies over the launcher's buttons; whatever a failing test leaves open
+// is closed when it ends.
 const wchar_t* const kStartedWindowClasses[] = {L"Brask", L"VemoCreatorWindow", L"TrivexWindow",
                                                 L"KelpaWindow", L"Notepad"};
 
@@ -186,6 +187,17 @@ class Commands : public testing::Test {
         launcher.WaitForExit(kWindowWaitMs);
     }
 
+    // Waits for the window a started program shows (it logs before it makes its window), and
+    // closes it.
+    static void CloseWindowOf(const wchar_t* className) {
+        HWND started = nullptr;
+        ASSERT_TRUE(WaitUntil(
+            [&] { return (started = FindWindowW(className, nullptr)) != nullptr; }, kWindowWaitMs))
+            << "no window of class " << className;
+        PostMessageW(started, WM_CLOSE, 0, 0);
+        EXPECT_TRUE(WaitUntil([&] { return !IsWindow(started); }, kWindowWaitMs));
+    }
+
     static void CloseStartedPrograms() {
         for (const wchar_t* className : kStartedWindowClasses) {
             while (HWND started = FindWindowW(className, nullptr)) {
@@ -286,7 +298,7 @@ TEST_F(Commands, EachLanguageInstallsAndOpensItsReadmeInTheSystemNotepad) {
         EXPECT_TRUE(SameTextIgnoringCase(notepad->image, SystemNotepad())) << notepad->image;
         EXPECT_NE(notepad->title.find(row.readme), std::wstring::npos) << notepad->title;
         EXPECT_EQ(notepad->text, Utf16File(disc.Path(L"Support\\") + row.readme));
-        CloseStartedPrograms();
+        CloseWindowOf(L"Notepad");
 
         EXPECT_TRUE(StillRunning());
         EndLauncher();
@@ -356,7 +368,7 @@ TEST_F(Commands, ReadmeOpensTheSystemNotepadNotOnePlantedOnTheDiscOrInTheCurrent
     ASSERT_TRUE(notepad) << "Notepad did not open; programs that logged: " << log.Lines().size();
     EXPECT_TRUE(SameTextIgnoringCase(notepad->image, SystemNotepad())) << notepad->image;
     EXPECT_EQ(notepad->text, Utf16File(disc.Path(L"Support\\readme.txt"))) << notepad->title;
-    CloseStartedPrograms();
+    CloseWindowOf(L"Notepad");
 
     // Anything started by the readme command has logged long before the web site's browser.
     ASSERT_TRUE(Press(107));
@@ -373,13 +385,14 @@ TEST_F(Commands, InformationPanelStartsTheSupportToolOrHelpPageAndTheRegistratio
         const wchar_t* option;
         const wchar_t* program;
         const wchar_t* arguments;
-        const wchar_t* folder;  // on the disc
+        const wchar_t* folder;       // on the disc
+        const wchar_t* windowClass;  // of the window it shows, if any
     };
     const Row rows[] = {
-        {1, L"-l0409", L"Trivex.exe", L"", L"Support"},
-        {3, L"-l0404", L"Trivex.exe", L"", L"Support"},
-        {2, L"-l040c", L"viewer.exe", L"\"IX_Help_Fr.htm\"", L"Support\\ix help\\fr-fr"},
-        {6, L"-l0409", L"viewer.exe", L"\"IX_Help_Select.htm\"", L"Support\\ix help"},
+        {1, L"-l0409", L"Trivex.exe", L"", L"Support", L"TrivexWindow"},
+        {3, L"-l0404", L"Trivex.exe", L"", L"Support", L"TrivexWindow"},
+        {2, L"-l040c", L"viewer.exe", L"\"IX_Help_Fr.htm\"", L"Support\\ix help\\fr-fr", nullptr},
+        {6, L"-l0409", L"viewer.exe", L"\"IX_Help_Select.htm\"", L"Support\\ix help", nullptr},
     };
     std::size_t logged = 0;
     for (const Row& row : rows) {
@@ -391,13 +404,13 @@ TEST_F(Commands, InformationPanelStartsTheSupportToolOrHelpPageAndTheRegistratio
         auto lines = log.WaitForLines(++logged);
         ASSERT_EQ(lines.size(), logged);
         ExpectStarted(lines.back(), row.program, row.arguments, disc.Path(row.folder));
-        CloseStartedPrograms();
+        if (row.windowClass) CloseWindowOf(row.windowClass);
 
         ASSERT_TRUE(PressInPanel(108, 303));
         lines = log.WaitForLines(++logged);
         ASSERT_EQ(lines.size(), logged);
         ExpectStarted(lines.back(), L"Kelpa.exe", L"", disc.Path(L"Support"));
-        CloseStartedPrograms();
+        CloseWindowOf(L"KelpaWindow");
 
         EXPECT_TRUE(StillRunning());
         EndLauncher();
@@ -428,11 +441,12 @@ TEST_F(Commands, PlayCommandsStartTheGameOrCreatorAndEndTheLauncher) {
         const wchar_t* program;
         const wchar_t* arguments;
         bool inCreatorFolder;
+        const wchar_t* windowClass;
     };
     const Row rows[] = {
-        {150, L"Vemo.exe", L"", false},
-        {151, L"Vemo.exe", L"-r1024x768", false},
-        {152, L"TheVemoCreator.exe", L"", true},
+        {150, L"Vemo.exe", L"", false, L"Brask"},
+        {151, L"Vemo.exe", L"-r1024x768", false, L"Brask"},
+        {152, L"TheVemoCreator.exe", L"", true, L"VemoCreatorWindow"},
     };
     std::size_t logged = 0;
     for (const Row& row : rows) {
@@ -445,7 +459,7 @@ TEST_F(Commands, PlayCommandsStartTheGameOrCreatorAndEndTheLauncher) {
         ExpectStarted(lines.back(), row.program, row.arguments,
                       row.inCreatorFolder ? game.CreatorFolder() : game.GameFolder());
         // The game's window stops the next launcher from starting.
-        CloseStartedPrograms();
+        CloseWindowOf(row.windowClass);
     }
 }
 
