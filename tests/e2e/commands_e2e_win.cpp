@@ -78,13 +78,6 @@ std::wstring Utf16File(const std::wstring& path) {
     return text;
 }
 
-// What Notepad shows: its title, its text, and the program file of its process.
-struct NotepadSeen {
-    std::wstring title;
-    std::wstring text;
-    std::wstring image;
-};
-
 // GetWindowText does not ask another program's control for its text; the message does.
 std::wstring EditText(HWND edit) {
     DWORD_PTR length = 0;
@@ -95,24 +88,6 @@ std::wstring EditText(HWND edit) {
                         SMTO_ABORTIFHUNG, 5000, &copied);
     text.resize(copied);
     return text;
-}
-
-std::optional<NotepadSeen> WaitForNotepad() {
-    HWND window = nullptr;
-    if (!WaitUntil([&] { return (window = FindWindowW(L"Notepad", nullptr)) != nullptr; },
-                   kWindowWaitMs)) {
-        return std::nullopt;
-    }
-    HWND edit = FindWindowExW(window, nullptr, L"Edit", nullptr);
-    // The window shows before the file is read into it.
-    WaitUntil([&] { return edit && !EditText(edit).empty(); }, 5000);
-    NotepadSeen seen;
-    seen.title = WindowText(window);
-    if (edit) seen.text = EditText(edit);
-    DWORD processId = 0;
-    GetWindowThreadProcessId(window, &processId);
-    seen.image = ProcessImage(processId);
-    return seen;
 }
 
 std::wstring SystemNotepad() {
@@ -196,6 +171,24 @@ class Commands : public testing::Test {
             << "no window of class " << className;
         PostMessageW(started, WM_CLOSE, 0, 0);
         EXPECT_TRUE(WaitUntil([&] { return !IsWindow(started); }, kWindowWaitMs));
+    }
+
+    // Waits for Notepad, and checks that it is the system folder's and shows `file`.
+    void ExpectSystemNotepadShowing(const std::wstring& file) {
+        HWND notepad = nullptr;
+        ASSERT_TRUE(WaitUntil(
+            [&] { return (notepad = FindWindowW(L"Notepad", nullptr)) != nullptr; }, kWindowWaitMs))
+            << "Notepad did not open; programs that logged: " << log.Lines().size();
+        DWORD processId = 0;
+        GetWindowThreadProcessId(notepad, &processId);
+        const std::wstring image = ProcessImage(processId);
+        EXPECT_TRUE(SameTextIgnoringCase(image, SystemNotepad())) << image;
+        // The window shows before the file is read into it.
+        HWND edit = FindWindowExW(notepad, nullptr, L"Edit", nullptr);
+        const std::wstring text = Utf16File(file);
+        EXPECT_TRUE(WaitUntil([&] { return EditText(edit) == text; }, 5000))
+            << "Notepad shows " << WindowText(notepad);
+        CloseWindowOf(L"Notepad");
     }
 
     static void CloseStartedPrograms() {
@@ -293,12 +286,7 @@ TEST_F(Commands, EachLanguageInstallsAndOpensItsReadmeInTheSystemNotepad) {
         ExpectStarted(lines.back(), L"setup.exe", row.installerParameters, disc.Path(L"Setup"));
 
         ASSERT_TRUE(PressInPanel(108, 301));
-        std::optional<NotepadSeen> notepad = WaitForNotepad();
-        ASSERT_TRUE(notepad) << "Notepad did not open";
-        EXPECT_TRUE(SameTextIgnoringCase(notepad->image, SystemNotepad())) << notepad->image;
-        EXPECT_NE(notepad->title.find(row.readme), std::wstring::npos) << notepad->title;
-        EXPECT_EQ(notepad->text, Utf16File(disc.Path(L"Support\\") + row.readme));
-        CloseWindowOf(L"Notepad");
+        ExpectSystemNotepadShowing(disc.Path(L"Support\\") + row.readme);
 
         EXPECT_TRUE(StillRunning());
         EndLauncher();
@@ -364,11 +352,7 @@ TEST_F(Commands, ReadmeOpensTheSystemNotepadNotOnePlantedOnTheDiscOrInTheCurrent
     ASSERT_TRUE(started);
 
     ASSERT_TRUE(PressInPanel(108, 301));
-    std::optional<NotepadSeen> notepad = WaitForNotepad();
-    ASSERT_TRUE(notepad) << "Notepad did not open; programs that logged: " << log.Lines().size();
-    EXPECT_TRUE(SameTextIgnoringCase(notepad->image, SystemNotepad())) << notepad->image;
-    EXPECT_EQ(notepad->text, Utf16File(disc.Path(L"Support\\readme.txt"))) << notepad->title;
-    CloseWindowOf(L"Notepad");
+    ExpectSystemNotepadShowing(disc.Path(L"Support\\readme.txt"));
 
     // Anything started by the readme command has logged long before the web site's browser.
     ASSERT_TRUE(Press(107));
