@@ -5,22 +5,22 @@
 #define AUTOPLAY_LOCALE_REGIONAL_SITES_H
 
 #define VEMO_SITE_INTERNATIONAL "www.vemo.example"
-#define VEMO_SITE_FRANCE "fr.vemo.example"
-#define VEMO_SITE_GERMANY "de.vemo.example"
-#define VEMO_SITE_SWEDEN "se.vemo.example"
-#define VEMO_SITE_NETHERLANDS "nl.vemo.example"
-#define VEMO_SITE_BRAZIL "br.vemo.example"
-#define VEMO_SITE_SPAIN "es.vemo.example"
-#define VEMO_SITE_ITALY "it.vemo.example"
-#define VEMO_SITE_JAPAN "jp.vemo.example"
-#define VEMO_SITE_TAIWAN "tw.vemo.example"
+#define VEMO_SITE_FRANCE "www.fr.vemo.example"
+#define VEMO_SITE_GERMANY "www.de.vemo.example"
+#define VEMO_SITE_SWEDEN "www.se.vemo.example"
+#define VEMO_SITE_NETHERLANDS "www.nl.vemo.example"
+#define VEMO_SITE_BRAZIL "www.br.vemo.example"
+#define VEMO_SITE_SPAIN "www.es.vemo.example"
+#define VEMO_SITE_ITALY "www.it.vemo.example"
+#define VEMO_SITE_JAPAN "www.jp.vemo.example"
+#define VEMO_SITE_TAIWAN "www.tw.vemo.example"
 #define VEMO_SITE_KOREA "kr.vemo.example"
-#define VEMO_SITE_UNITED_KINGDOM "uk.vemo.example"
-#define VEMO_SITE_NORWAY "no.vemo.example"
-#define VEMO_SITE_DENMARK "dk.vemo.example"
+#define VEMO_SITE_UNITED_KINGDOM "www.uk.vemo.example"
+#define VEMO_SITE_NORWAY "www.no.vemo.example"
+#define VEMO_SITE_DENMARK "www.dk.vemo.example"
 
-// Korea's site is reached through one full address; every other site is opened
-// by its bare host name.
+// Korea's site is reached through one full address; every other site is opened by its bare
+// host name, which the shell takes for a web address only when it starts with "www.".
 #define VEMO_SITE_KOREA_ADDRESS "http://" VEMO_SITE_KOREA "/index.html"
 
 #endif

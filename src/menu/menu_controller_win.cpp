@@ -69,6 +69,8 @@ void MenuController::ShowInstallOrPlay() {
         changed |= play->SetWanted(installed);
         play->Show(play->wanted);
     }
+    // The play panel goes with its button: its commands need the game that has just gone.
+    if (!installed && panelOpen && lastPanel == PlayPanel) TogglePanel(PlayPanel);
     // The caption beside the button is part of the window's picture: "Install" must not stay
     // written beside the Play button until something else repaints the window.
     if (changed && launcher.mainWindow) InvalidateRect(launcher.mainWindow, nullptr, FALSE);

@@ -38,12 +38,12 @@ std::wstring BuiltDisc() {
 
 }  // namespace
 
-SampleDisc::SampleDisc() {
+SampleDisc::SampleDisc(const std::wstring& name) {
     wchar_t base[MAX_PATH];
     GetTempPathW(MAX_PATH, base);
     static unsigned counter = 0;
-    root_ = std::wstring(base) + L"autoplay-sample-disc-" + std::to_wstring(GetCurrentProcessId()) +
-            L"-" + std::to_wstring(++counter) + L"\\";
+    root_ = std::wstring(base) + name + L"-" + std::to_wstring(GetCurrentProcessId()) + L"-" +
+            std::to_wstring(++counter) + L"\\";
     RemoveTree(root_);
     std::wstring built = BuiltDisc();
     EXPECT_NE(GetFileAttributesW((built + L"AutoPlay.exe").c_str()), INVALID_FILE_ATTRIBUTES)

@@ -7,8 +7,9 @@
 
 class SampleDisc {
   public:
-    // Copies the built disc (the "disc" folder beside the test program's folder).
-    SampleDisc();
+    // Copies the built disc (the "disc" folder beside the test program's folder) into a new
+    // folder whose name starts with `name`.
+    explicit SampleDisc(const std::wstring& name = L"autoplay-sample-disc");
     // Removes the copy; programs started from it get a few seconds to close first.
     ~SampleDisc();
     SampleDisc(const SampleDisc&) = delete;

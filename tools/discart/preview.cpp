@@ -132,7 +132,7 @@ Picture PanelMockup(Art& art, const FontLibrary& fonts) {
     DrawFace(art, screen, 9, 3, 372, 323);
     DrawFace(art, screen, 10, 0, 405, 411);
     DrawCaption(screen, fonts, "Spielen", 187, 237);
-    DrawCaption(screen, fonts, "Besuchen Sie de.vemo.example", 262, 278);
+    DrawCaption(screen, fonts, "Besuchen Sie www.de.vemo.example", 262, 278);
     DrawCaption(screen, fonts, "Mehr Vemo-Spiele", 329, 332);
     DrawCaption(screen, fonts, "Weitere Informationen", 370, 391);
     DrawCaption(screen, fonts, "Beenden", 398, 443);
