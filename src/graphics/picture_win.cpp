@@ -175,49 +175,76 @@ DibBitmap* LoadPictureFileThroughGdi(const wchar_t* path, UINT flags) {
     return PictureFromLoadedImage(LoadImageW(nullptr, path, IMAGE_BITMAP, 0, 0, flags));
 }
 
-// The system's loader trusts the file's header, so a file from the disc is looked at first: a
-// truncated or corrupt one counts as missing. Where the stored bytes are the picture, the rows
-// go from the file straight into the picture's block and the file is read only once.
-DibBitmap* LoadPictureFile(const wchar_t* path, UINT flags) {
-    UniqueHandle file(CreateFileW(path, GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING,
-                                  FILE_ATTRIBUTE_NORMAL | FILE_FLAG_SEQUENTIAL_SCAN, nullptr));
-    if (!file) return nullptr;
-    LARGE_INTEGER fileSize{};
-    if (!GetFileSizeEx(file.Get(), &fileSize) || fileSize.QuadPart > kLargestPictureFile) {
-        return nullptr;
-    }
-    const auto size = static_cast<std::size_t>(fileSize.QuadPart);
+namespace {
+
+// A picture file opened and its head checked: the system's loader trusts the file's header, so
+// a file from the disc is looked at first, and a truncated or corrupt one counts as missing.
+struct CheckedPictureFile {
+    UniqueHandle file;
+    std::size_t size = 0;
     std::uint8_t head[kBmpHeadSize];
-    const std::size_t headSize = size < kBmpHeadSize ? size : kBmpHeadSize;
-    if (!ReadExactly(file.Get(), head, headSize) || !BmpFileIsWhole(head, headSize, size)) {
+    std::size_t headSize = 0;
+};
+
+bool OpenCheckedPictureFile(const wchar_t* path, CheckedPictureFile& checked) {
+    checked.file.Reset(CreateFileW(path, GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING,
+                                   FILE_ATTRIBUTE_NORMAL | FILE_FLAG_SEQUENTIAL_SCAN, nullptr));
+    if (!checked.file) return false;
+    LARGE_INTEGER fileSize{};
+    if (!GetFileSizeEx(checked.file.Get(), &fileSize) || fileSize.QuadPart > kLargestPictureFile) {
+        return false;
+    }
+    checked.size = static_cast<std::size_t>(fileSize.QuadPart);
+    checked.headSize = checked.size < kBmpHeadSize ? checked.size : kBmpHeadSize;
+    return ReadExactly(checked.file.Get(), checked.head, checked.headSize) &&
+           BmpFileIsWhole(checked.head, checked.headSize, checked.size);
+}
+
+}  // namespace
+
+DibBitmap* ReadStoredPictureFile(const wchar_t* path, bool& gdiNeeded) {
+    gdiNeeded = false;
+    CheckedPictureFile checked;
+    if (!OpenCheckedPictureFile(path, checked)) return nullptr;
+    std::uint32_t pixelOffset = 0;
+    std::memcpy(&pixelOffset, checked.head + 10, sizeof(pixelOffset));
+    // The check has made sure the rows start after the headers and end inside the file.
+    std::optional<StoredPictureLayout> layout = StoredPictureLayoutOf(
+        checked.head + kBmpFileHeaderSize, checked.headSize - kBmpFileHeaderSize,
+        checked.size - kBmpFileHeaderSize, pixelOffset - kBmpFileHeaderSize);
+    if (!layout) {
+        gdiNeeded = true;
         return nullptr;
     }
-    if (StoredBytesSurviveGdi(flags)) {
-        std::uint32_t pixelOffset = 0;
-        std::memcpy(&pixelOffset, head + 10, sizeof(pixelOffset));
-        // The check has made sure the rows start after the headers and end inside the file.
-        std::optional<StoredPictureLayout> layout =
-            StoredPictureLayoutOf(head + kBmpFileHeaderSize, headSize - kBmpFileHeaderSize,
-                                  size - kBmpFileHeaderSize, pixelOffset - kBmpFileHeaderSize);
-        if (layout) {
-            DibPtr picture(DibForStoredPicture(head + kBmpFileHeaderSize, *layout));
-            LARGE_INTEGER rows{};
-            rows.QuadPart = pixelOffset;
-            if (!picture || !SetFilePointerEx(file.Get(), rows, nullptr, FILE_BEGIN)) {
-                return nullptr;
-            }
-            auto* block = reinterpret_cast<std::uint8_t*>(picture.get());
-            // Whole a moment ago and unreadable now is as good as missing.
-            if (!ReadExactly(file.Get(), block + DibBlockSize(picture.get()) - layout->rowBytes,
-                             layout->rowBytes)) {
-                return nullptr;
-            }
-            return picture.release();
-        }
+    DibPtr picture(DibForStoredPicture(checked.head + kBmpFileHeaderSize, *layout));
+    LARGE_INTEGER rows{};
+    rows.QuadPart = pixelOffset;
+    if (!picture || !SetFilePointerEx(checked.file.Get(), rows, nullptr, FILE_BEGIN)) {
+        return nullptr;
     }
-    file.Reset();
+    auto* block = reinterpret_cast<std::uint8_t*>(picture.get());
+    // Whole a moment ago and unreadable now is as good as missing.
+    if (!ReadExactly(checked.file.Get(), block + DibBlockSize(picture.get()) - layout->rowBytes,
+                     layout->rowBytes)) {
+        return nullptr;
+    }
+    return picture.release();
+}
+
+DibBitmap* LoadPictureFile(const wchar_t* path, UINT flags) {
+    if (StoredBytesSurviveGdi(flags)) {
+        bool gdiNeeded = false;
+        DibBitmap* picture = ReadStoredPictureFile(path, gdiNeeded);
+        return gdiNeeded ? LoadPictureFileThroughGdi(path, flags) : picture;
+    }
+    CheckedPictureFile checked;
+    if (!OpenCheckedPictureFile(path, checked)) return nullptr;
+    checked.file.Reset();
     return LoadPictureFileThroughGdi(path, flags);
 }
+
+// Whether stored bytes are taken as they are for pictures loaded with these flags.
+bool PicturesKeepTheirStoredBytes(UINT flags) { return StoredBytesSurviveGdi(flags); }
 
 bool LoadPaletteResource(WORD id, LOGPALETTE* palette) {
     constexpr std::size_t kHeaderBytes = 24;

@@ -32,6 +32,13 @@ int StretchDibBlt(HDC dc, int x, int y, int width, int height, const DibBitmap* 
 DibBitmap* LoadPictureResource(WORD id, UINT flags);
 // Null for a missing, unreadable or corrupt file.
 DibBitmap* LoadPictureFile(const wchar_t* path, UINT flags);
+// The part of LoadPictureFile that needs no GDI, so any thread may run it: the picture made
+// straight from a whole file's stored bytes. Null for a missing or corrupt file, and also, with
+// `gdiNeeded` set, for a whole file that only the system's loader can read.
+DibBitmap* ReadStoredPictureFile(const wchar_t* path, bool& gdiNeeded);
+// Whether LoadPictureFile and LoadPictureResource take pictures loaded with these flags as
+// their stored bytes (displays of more than 8 bits per pixel).
+bool PicturesKeepTheirStoredBytes(UINT flags);
 
 // The two ways those loads take, for the tests that hold them to the same bytes: always
 // through LoadImage and DibFromBitmap, and straight from the resource's bytes (null when

@@ -102,14 +102,69 @@ DibBitmap* IconMaskFor(int state, std::int32_t key) {
 
 DibBitmap* BackgroundFor(std::int32_t key) { return FindIn(catalogue.languageBackgrounds, key); }
 
+namespace {
+
+// The background files are most of what start-up reads, and reading them needs no GDI: a
+// thread of their own reads them while the display starts and the program's own pictures load.
+struct BackgroundReadAhead {
+    std::wstring rootPath;
+    HANDLE thread = nullptr;
+    std::array<DibBitmap*, kLanguageCount> pictures{};
+    std::array<bool, kLanguageCount> gdiNeeded{};
+};
+BackgroundReadAhead readAhead;
+
+DWORD WINAPI ReadBackgroundFiles(void*) {
+    for (std::size_t i = 0; i < kLanguageCount; ++i) {
+        const std::wstring path = readAhead.rootPath + Languages()[i].backgroundFile;
+        bool gdiNeeded = false;
+        readAhead.pictures[i] = ReadStoredPictureFile(path.c_str(), gdiNeeded);
+        readAhead.gdiNeeded[i] = gdiNeeded;
+    }
+    return 0;
+}
+
+void StartReadingBackgrounds() {
+    readAhead.rootPath = launcher.rootPath;
+    readAhead.thread = CreateThread(nullptr, 0, ReadBackgroundFiles, nullptr, 0, nullptr);
+}
+
+// What the thread read, once it is done; null when it never ran or GDI must read the file.
+DibPtr TakeReadAhead(std::size_t language, bool& ready, bool& gdiNeeded) {
+    ready = readAhead.thread != nullptr;
+    gdiNeeded = readAhead.gdiNeeded[language];
+    return DibPtr(std::exchange(readAhead.pictures[language], nullptr));
+}
+
+void FinishReadingBackgrounds() {
+    if (!readAhead.thread) return;
+    WaitForSingleObject(readAhead.thread, INFINITE);
+    CloseHandle(readAhead.thread);
+    readAhead.thread = nullptr;
+    for (DibBitmap*& picture : readAhead.pictures) DibFree(std::exchange(picture, nullptr));
+}
+
+}  // namespace
+
 bool LoadBackgrounds() {
     PictureTable& backgrounds = catalogue.languageBackgrounds;
     backgrounds[0].reset(LoadPictureResource(kLanguageListBackgroundId, kLoadResourcePicture));
-    for (const LanguageInfo& language : Languages()) {
-        std::wstring path = std::wstring(launcher.rootPath) + language.backgroundFile;
-        backgrounds[static_cast<std::int32_t>(language.base)].reset(
-            LoadPictureFile(path.c_str(), kLoadFilePicture));
+    // The pictures read ahead are the files' stored bytes, which are the pictures only where
+    // GDI would hand those bytes back unchanged; anywhere else GDI reads the files again.
+    const bool storedBytes = PicturesKeepTheirStoredBytes(kLoadFilePicture);
+    if (readAhead.thread) WaitForSingleObject(readAhead.thread, INFINITE);
+    for (std::size_t i = 0; i < kLanguageCount; ++i) {
+        const LanguageInfo& language = Languages()[i];
+        const std::wstring path = std::wstring(launcher.rootPath) + language.backgroundFile;
+        bool ready = false;
+        bool gdiNeeded = false;
+        DibPtr picture = TakeReadAhead(i, ready, gdiNeeded);
+        if (!ready || !storedBytes || gdiNeeded) {
+            picture.reset(LoadPictureFile(path.c_str(), kLoadFilePicture));
+        }
+        backgrounds[static_cast<std::int32_t>(language.base)] = std::move(picture);
     }
+    FinishReadingBackgrounds();
 
     // A disc file of another shape counts as missing, and so would a language-selection
     // picture that is not what the program was built with; the size never comes from a file.
@@ -148,6 +203,8 @@ void AddPrivateFont() {
 void LoadBackgroundPictures() {
     LoadBackgrounds();
 }
+
+void ReadBackgroundsAhead() { StartReadingBackgrounds(); }
 
 void LoadPlates() {
     for (std::int32_t key = 0; key < kPlateKeys; ++key) {
@@ -202,16 +259,19 @@ void ApplyPaletteToPanelPlates() {
     }
 }
 
+// The background files are read on a thread of their own from the first step on, and taken in
+// the last one, so their reading overlaps everything else.
 constexpr std::array<CatalogueStep, kCatalogueStepCount> kSteps = {{
+    {"background files (read ahead)", ReadBackgroundsAhead},
     {"palette", MakeLauncherPalette},
     {"private font", AddPrivateFont},
     {"fonts", CreateFonts},
-    {"backgrounds", LoadBackgroundPictures},
     {"plates", LoadPlates},
     {"panels and mask", LoadPanels},
     {"icons and masks", LoadIcons},
     {"clones", CloneListAboutPictures},
     {"plate colours", ApplyPaletteToPanelPlates},
+    {"backgrounds", LoadBackgroundPictures},
 }};
 
 }  // namespace
@@ -225,6 +285,7 @@ void LoadCatalogue() {
 }
 
 void ReleaseCatalogue() {
+    FinishReadingBackgrounds();
     for (FontSlot slot : kFontReleaseOrder) {
         HFONT& font = catalogue.fontSlots[static_cast<int>(slot)];
         if (font) DeleteObject(font);

@@ -46,7 +46,7 @@ struct CatalogueStep {
     const char* name;
     void (*run)();
 };
-constexpr std::size_t kCatalogueStepCount = 9;
+constexpr std::size_t kCatalogueStepCount = 10;
 const std::array<CatalogueStep, kCatalogueStepCount>& CatalogueSteps();
 
 // Lookups: null when the table has no such entry.

@@ -186,7 +186,7 @@ class Commands : public testing::Test {
         // The window shows before the file is read into it.
         HWND edit = FindWindowExW(notepad, nullptr, L"Edit", nullptr);
         const std::wstring text = Utf16File(file);
-        EXPECT_TRUE(WaitUntil([&] { return EditText(edit) == text; }, 5000))
+        EXPECT_TRUE(WaitUntil([&] { return EditText(edit) == text; }, kWindowWaitMs))
             << "Notepad shows " << WindowText(notepad);
         CloseWindowOf(L"Notepad");
     }

@@ -3,6 +3,7 @@
 // registry, and a screen built while memory runs out.
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <cstdlib>
 #include <new>
 #include <set>
@@ -17,13 +18,16 @@
 
 // Allocations can be made to fail from a chosen one on; `liveAllocations` tells leaks.
 namespace {
-long failAfter = -1;
-long liveAllocations = 0;
+// Atomic: start-up reads the background files on a thread of its own.
+std::atomic<long> failAfter{-1};
+std::atomic<long> liveAllocations{0};
 }  // namespace
 
 void* operator new(std::size_t size) {
-    if (failAfter == 0) throw std::bad_alloc();
-    if (failAfter > 0) --failAfter;
+    long left = failAfter.load();
+    while (left > 0 && !failAfter.compare_exchange_weak(left, left - 1)) {
+    }
+    if (left == 0) throw std::bad_alloc();
     void* block = std::malloc(size ? size : 1);
     if (!block) throw std::bad_alloc();
     ++liveAllocations;
