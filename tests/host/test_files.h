@@ -1,7 +1,7 @@
-// Disc folders for the disc check's tests: a temporary folder removed at the end of the test,
-// files written into it, and bitmap files of any size and depth.
-#ifndef AUTOPLAY_TESTS_HOST_DISCCHECK_SUPPORT_H
-#define AUTOPLAY_TESTS_HOST_DISCCHECK_SUPPORT_H
+// Files for the host tests: a temporary folder removed at the end of the test, files written
+// into it, and bitmap files of any size and depth.
+#ifndef AUTOPLAY_TESTS_HOST_TEST_FILES_H
+#define AUTOPLAY_TESTS_HOST_TEST_FILES_H
 
 #include <unistd.h>
 
@@ -43,24 +43,32 @@ inline void WriteFile(const std::filesystem::path& path, const std::string& text
     WriteFile(path, std::vector<std::uint8_t>(text.begin(), text.end()));
 }
 
-// A bitmap file with a 40-byte header, a grey colour table at 8 bits or fewer and zero pixels.
+// A bitmap file with a 40-byte (or a 12-byte core) header, a zero colour table at 8 bits or
+// fewer and zero pixels.
 inline std::vector<std::uint8_t> BmpFile(std::int32_t width, std::int32_t height,
-                                         std::uint16_t bitCount) {
+                                         std::uint16_t bitCount, std::uint32_t headerSize = 40) {
     const std::uint32_t stride = ((static_cast<std::uint32_t>(width) * bitCount + 31) / 32) * 4;
     const std::uint32_t colors = bitCount <= 8 ? (1u << bitCount) : 0;
-    const std::uint32_t offset = 14 + 40 + colors * 4;
+    const std::uint32_t offset = 14 + headerSize + colors * (headerSize == 12 ? 3 : 4);
     std::vector<std::uint8_t> file(offset + stride * static_cast<std::uint32_t>(std::abs(height)));
     auto put32 = [&](std::size_t at, std::uint32_t v) { std::memcpy(&file[at], &v, 4); };
-    auto put16 = [&](std::size_t at, std::uint16_t v) { std::memcpy(&file[at], &v, 2); };
+    auto put16 = [&](std::size_t at, std::uint32_t v) { std::memcpy(&file[at], &v, 2); };
     file[0] = 'B';
     file[1] = 'M';
     put32(2, static_cast<std::uint32_t>(file.size()));
     put32(10, offset);
-    put32(14, 40);
-    put32(18, static_cast<std::uint32_t>(width));
-    put32(22, static_cast<std::uint32_t>(height));
-    put16(26, 1);
-    put16(28, bitCount);
+    put32(14, headerSize);
+    if (headerSize == 12) {
+        put16(18, static_cast<std::uint32_t>(width));
+        put16(20, static_cast<std::uint32_t>(height));
+        put16(22, 1);
+        put16(24, bitCount);
+    } else {
+        put32(18, static_cast<std::uint32_t>(width));
+        put32(22, static_cast<std::uint32_t>(height));
+        put16(26, 1);
+        put16(28, bitCount);
+    }
     return file;
 }
 
