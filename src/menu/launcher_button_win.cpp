@@ -98,7 +98,7 @@ void LauncherButton::Draw(ButtonState state, HDC dc) {
     CopyOut(dc, x, y, faceWidth, faceHeight);
     if (label.empty()) return;
 
-    const int saved = SaveDC(dc);
+    DcStateGuard saved(dc);
     if (HFONT font = FontFor(labelLanguage)) SelectObject(dc, font);
     PaletteGuard palette(dc, launcher.palette.Get());
     SetTextColor(dc, LabelColor(state));
@@ -108,7 +108,6 @@ void LauncherButton::Draw(ButtonState state, HDC dc) {
     const int shift = state == kPressed ? 2 : 0;
     RECT area{-5 + shift, 10 + shift, width - 5 + shift, height + 10 + shift};
     DrawTextW(dc, label.c_str(), -1, &area, kLabelFormat);
-    RestoreDC(dc, saved);
 }
 
 bool LauncherButton::HitTest(std::int32_t, std::int32_t) const { return true; }
