@@ -2,77 +2,50 @@
 // Enter and Space press the focused one, Escape closes an open panel and nothing more.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <string>
 #include <vector>
 
-#include "e2e_support_win.h"
 #include "launcher_driver_win.h"
-#include "locale/config_win.h"
-#include "sample_disc_win.h"
-#include "test_support_win.h"
 
 namespace {
 
-class Keyboard : public testing::Test {
-protected:
-    void SetUp() override {
-        DeleteMachineKey(kProductKeyPath);
-        DeleteMachineKey(kLocaleKeyPath);
-    }
-    void TearDown() override {
-        for (HWND shown : TopLevelWindows(launcher.Id(), L"LauncherAppClass")) {
-            PostMessageW(shown, WM_CLOSE, 0, 0);
-        }
-        launcher.WaitForExit(kWindowWaitMs);
-        DeleteMachineKey(kLocaleKeyPath);
+// The user returns to the launcher (after a program it started took the front).
+void ComeBack(HWND window) {
+    SetForegroundWindow(window);
+    WaitUntil([&] { return GetForegroundWindow() == window; });
+}
+
+class Keyboard : public LauncherTest {
+  protected:
+    // From here on only keys are used.
+    bool StartWithKeys() {
+        if (!Start(L"-l0409")) return false;
+        ComeBack(window);
+        return true;
     }
 
-    HWND Start(const std::wstring& arguments) {
-        if (!launcher.Start(disc.Launcher(), arguments, disc.Root())) return nullptr;
-        window = WaitForWindow(launcher.Id(), L"LauncherAppClass");
-        if (!window) return nullptr;
-        SettledShot(window);
-        // The mouse rests on the plain background; from here on only keys are used.
-        MoveMouse(window, {600, 20});
-        ComeBack();
-        return window;
-    }
-
-    // The user returns to the launcher (after a program it started took the front).
-    void ComeBack() {
-        SetForegroundWindow(window);
-        WaitUntil([&] { return GetForegroundWindow() == window; });
-    }
-
-    int FocusedId() {
+    int FocusedId() const {
         HWND focus = FocusInThreadOf(window);
         return focus && GetParent(focus) == window ? GetDlgCtrlID(focus) : 0;
     }
 
     // Presses Tab until the button with this id has the focus (at most a round of stops).
-    bool TabTo(int id) {
+    bool TabTo(int id) const {
         for (int i = 0; i < 12 && FocusedId() != id; ++i) PressKey(VK_TAB);
         return FocusedId() == id;
     }
 
     // A program the launcher started shows its window; the user closes it and comes back.
-    bool CloseProgramWindow(const wchar_t* className) {
-        HWND shown = nullptr;
-        WaitUntil([&] { return (shown = FindWindowW(className, nullptr)) != nullptr; });
-        if (shown) PostMessageW(shown, WM_CLOSE, 0, 0);
-        WaitUntil([&] { return !IsWindow(shown); });
-        ComeBack();
-        return shown != nullptr;
+    bool CloseProgramWindow(const wchar_t* className) const {
+        const bool closed = CloseWindowOf(className);
+        ComeBack(window);
+        return closed;
     }
-
-    SampleDisc disc;
-    TestProcess launcher;
-    CompanionLog log;
-    HWND window = nullptr;
 };
 
 TEST_F(Keyboard, TabAndTheArrowsWalkTheButtonsInReadingOrderWithTheirHoverFace) {
-    ASSERT_TRUE(Start(L"-l0409"));
+    ASSERT_TRUE(StartWithKeys());
     EXPECT_EQ(FocusedId(), 0) << "no button has the focus before a key is pressed";
     const std::vector<int> order = {101, 107, 103, 108, 1000, 110};
     for (int id : order) {
@@ -81,7 +54,7 @@ TEST_F(Keyboard, TabAndTheArrowsWalkTheButtonsInReadingOrderWithTheirHoverFace) 
     }
     PressKey(VK_TAB);
     EXPECT_EQ(FocusedId(), 101) << "Tab goes round";
-    PressKey(VK_TAB, true);
+    PressKey(VK_TAB, VK_SHIFT);
     EXPECT_EQ(FocusedId(), 110) << "Shift+Tab goes back";
     PressKey(VK_UP);
     EXPECT_EQ(FocusedId(), 1000);
@@ -106,7 +79,7 @@ TEST_F(Keyboard, TabAndTheArrowsWalkTheButtonsInReadingOrderWithTheirHoverFace) 
 }
 
 TEST_F(Keyboard, EveryButtonOfTheMainPageAndOfAPanelCanBePressed) {
-    ASSERT_TRUE(Start(L"-l0409"));
+    ASSERT_TRUE(StartWithKeys());
 
     // Install: the disc's installer asks first; the user declines.
     ASSERT_TRUE(TabTo(101));
@@ -114,7 +87,7 @@ TEST_F(Keyboard, EveryButtonOfTheMainPageAndOfAPanelCanBePressed) {
     auto question = WaitForMessageBoxTitled(L"The Vemo Vodizuri Virezazida Setup");
     ASSERT_TRUE(question) << "Enter did not start the installer";
     ASSERT_TRUE(PressButton(*question, IDCANCEL));
-    ComeBack();
+    ComeBack(window);
 
     // The web site: a browser, or the launcher's message that there is none.
     ASSERT_TRUE(TabTo(107));
@@ -129,7 +102,7 @@ TEST_F(Keyboard, EveryButtonOfTheMainPageAndOfAPanelCanBePressed) {
         PressKey(VK_RETURN);  // the message box has the focus
         EXPECT_TRUE(WaitUntil([&] { return !IsWindow(noBrowser->window); }));
     }
-    ComeBack();
+    ComeBack(window);
 
     // More Games opens its panel; Escape closes it and leaves the focus on its button.
     ASSERT_TRUE(TabTo(103));
@@ -168,7 +141,7 @@ TEST_F(Keyboard, EveryButtonOfTheMainPageAndOfAPanelCanBePressed) {
     ASSERT_TRUE(about) << "Enter did not open the About box";
     PressKey(VK_RETURN);
     EXPECT_TRUE(WaitUntil([&] { return !IsWindow(about->window); }));
-    ComeBack();
+    ComeBack(window);
 
     // Exit ends the launcher.
     ASSERT_TRUE(TabTo(110));
