@@ -6,6 +6,10 @@
 #include <windows.h>
 
 #include <cstdio>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
 #include <optional>
 #include <string>
 #include <vector>
@@ -33,14 +37,10 @@ std::wstring ProcessImage(DWORD processId) {
 
 // The text of a UTF-16 file with a byte-order mark, as the disc's readme files are written.
 std::wstring Utf16File(const std::wstring& path) {
-    HANDLE file = CreateFileW(path.c_str(), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING,
-                              FILE_ATTRIBUTE_NORMAL, nullptr);
-    if (file == INVALID_HANDLE_VALUE) return L"";
-    std::wstring text(GetFileSize(file, nullptr) / sizeof(wchar_t), L'\0');
-    DWORD read = 0;
-    ReadFile(file, text.data(), static_cast<DWORD>(text.size() * sizeof(wchar_t)), &read, nullptr);
-    CloseHandle(file);
-    text.resize(read / sizeof(wchar_t));
+    std::ifstream file(std::filesystem::path(path), std::ios::binary);
+    const std::string bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    std::wstring text(bytes.size() / sizeof(wchar_t), L'\0');
+    std::memcpy(text.data(), bytes.data(), text.size() * sizeof(wchar_t));
     if (!text.empty() && text[0] == 0xFEFF) text.erase(0, 1);
     return text;
 }
@@ -157,15 +157,12 @@ const LanguageRow kLanguageRows[] = {
 TEST_F(Commands, EachLanguageInstallsOpensItsReadmeInTheSystemNotepadAndItsRegionalSite) {
     UseViewerAsInstaller();
     shell.OpenEverythingWithViewer();
-    std::size_t logged = 0;
     for (const LanguageRow& row : kLanguageRows) {
         SCOPED_TRACE(testing::Message() << "launcher " << row.option);
         ASSERT_TRUE(Start(row.option));
 
         ASSERT_TRUE(Press(101));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), L"setup.exe", row.installerParameters, disc.Path(L"Setup"));
+        log.ExpectNext(L"setup.exe", row.installerParameters, disc.Path(L"Setup"));
 
         ASSERT_TRUE(PressInPanel(108, 301));
         ExpectSystemNotepadShowing(disc.Path(L"Support\\") + row.readme);
@@ -175,9 +172,7 @@ TEST_F(Commands, EachLanguageInstallsOpensItsReadmeInTheSystemNotepadAndItsRegio
             ADD_FAILURE() << "the launcher said: " << box->caption;
             PressButton(*box, IDOK);
         } else {
-            lines = log.WaitForLines(++logged);
-            ASSERT_EQ(lines.size(), logged);
-            ExpectStarted(lines.back(), L"viewer.exe", Quoted(row.address), disc.Root());
+            log.ExpectNext(L"viewer.exe", Quoted(row.address), disc.Root());
         }
         EXPECT_TRUE(StillRunning());
         CloseLauncher();
@@ -206,9 +201,7 @@ TEST_F(Commands, ReadmeOpensTheSystemNotepadNotOnePlantedOnTheDiscOrInTheCurrent
 
     // Anything started by the readme command has logged long before the web site's browser.
     ASSERT_TRUE(Press(107));
-    auto lines = log.WaitForLines(1);
-    ASSERT_EQ(lines.size(), 1u) << "a planted notepad.exe ran";
-    ExpectStarted(lines[0], L"viewer.exe", L"\"http://www.vemo.example\"", current.Path());
+    log.ExpectNext(L"viewer.exe", L"\"http://www.vemo.example\"", current.Path());
     CloseLauncher();  // it holds on to its current folder
 }
 
@@ -228,24 +221,19 @@ TEST_F(Commands, InformationPanelStartsTheSupportToolOrHelpPageAndTheRegistratio
         {2, L"-l040c", L"viewer.exe", L"\"IX_Help_Fr.htm\"", L"Support\\ix help\\fr-fr", nullptr},
         {6, L"-l0409", L"viewer.exe", L"\"IX_Help_Select.htm\"", L"Support\\ix help", nullptr},
     };
-    std::size_t logged = 0;
     for (const Row& row : rows) {
         SCOPED_TRACE(testing::Message() << "edition " << row.edition << ", " << row.option);
         disc.SetEdition(row.edition);
         ASSERT_TRUE(Start(row.option));
 
         ASSERT_TRUE(PressInPanel(108, 302));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), row.program, row.arguments, disc.Path(row.folder));
+        log.ExpectNext(row.program, row.arguments, disc.Path(row.folder));
         if (row.windowClass) {
             EXPECT_TRUE(CloseWindowOf(row.windowClass));
         }
 
         ASSERT_TRUE(PressInPanel(108, 303));
-        lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), L"Kelpa.exe", L"", disc.Path(L"Support"));
+        log.ExpectNext(L"Kelpa.exe", L"", disc.Path(L"Support"));
         EXPECT_TRUE(CloseWindowOf(L"KelpaWindow"));
 
         EXPECT_TRUE(StillRunning());
@@ -258,13 +246,10 @@ TEST_F(Commands, DemosOpenInTheAssociatedPlayerFromTheDemosFolder) {
     ASSERT_TRUE(Start(L"-l0409"));
     const std::pair<int, const wchar_t*> demos[] = {
         {601, L"vemo2.mpg"}, {602, L"vemo2duskaro.mpg"}, {603, L"vemo2lorrel.mpg"}};
-    std::size_t logged = 0;
     for (const auto& [id, file] : demos) {
         SCOPED_TRACE(id);
         ASSERT_TRUE(PressInPanel(103, id));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), L"viewer.exe", Quoted(file), disc.Path(L"Demos"));
+        log.ExpectNext(L"viewer.exe", Quoted(file), disc.Path(L"Demos"));
     }
     EXPECT_TRUE(WaitForMessageBox(launcher.Id(), 1000) == std::nullopt);
     EXPECT_TRUE(StillRunning());
@@ -285,16 +270,13 @@ TEST_F(Commands, PlayCommandsStartTheGameOrCreatorAndEndTheLauncher) {
         {151, L"Vemo.exe", L"-r1024x768", false, L"Brask", L"The Vemo"},
         {152, L"TheVemoCreator.exe", L"", true, L"VemoCreatorWindow", L"The Vemo Creator"},
     };
-    std::size_t logged = 0;
     for (const Row& row : rows) {
         SCOPED_TRACE(row.id);
         ASSERT_TRUE(Start(L"-l0409"));
         ASSERT_TRUE(PressInPanel(102, row.id));
         EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), row.program, row.arguments,
-                      row.inCreatorFolder ? game.CreatorFolder() : game.GameFolder());
+        log.ExpectNext(row.program, row.arguments,
+                       row.inCreatorFolder ? game.CreatorFolder() : game.GameFolder());
         // The launcher knows the game's window by its class and title; while it is open the
         // next launcher ends at once.
         EXPECT_TRUE(WaitUntil([&] { return FindWindowW(row.windowClass, row.title) != nullptr; }));
@@ -388,16 +370,12 @@ TEST_F(Commands, WithoutDiscOneEveryDiscCommandAsksUntilCancelledAndTheRestNever
     ASSERT_TRUE(prompt);
     disc.PutBack(L"Setup\\data2.cab");
     ASSERT_TRUE(PressButton(*prompt, IDOK));
-    auto lines = log.WaitForLines(1);
-    ASSERT_EQ(lines.size(), 1u);
-    ExpectStarted(lines[0], L"setup.exe", L"-l0009", disc.Path(L"Setup"));
+    log.ExpectNext(L"setup.exe", L"-l0009", disc.Path(L"Setup"));
 
     // The web site and Exit never ask for the disc.
     disc.MoveAside(L"Setup\\data2.cab");
     ASSERT_TRUE(Press(107));
-    lines = log.WaitForLines(2);
-    ASSERT_EQ(lines.size(), 2u) << "a cancelled command started something";
-    ExpectStarted(lines[1], L"viewer.exe", L"\"http://www.vemo.example\"", disc.Root());
+    log.ExpectNext(L"viewer.exe", L"\"http://www.vemo.example\"", disc.Root());
     EXPECT_TRUE(WaitForMessageBox(launcher.Id(), 1000) == std::nullopt);
     ASSERT_TRUE(Press(110));
     EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));

@@ -6,6 +6,9 @@
 #include <algorithm>
 #include <cstdio>
 #include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
 
 #include "locale/config_win.h"
 
@@ -372,32 +375,6 @@ void AnswerMessageBox(DWORD processId, const std::wstring& caption, const std::w
     EXPECT_TRUE(PressButton(*box, answer));
 }
 
-namespace {
-
-// Copies `from` into the new folder `to`, both with trailing backslashes; false on any failure.
-bool CopyTree(const std::wstring& from, const std::wstring& to) {
-    if (!CreateDirectoryW(to.c_str(), nullptr) && GetLastError() != ERROR_ALREADY_EXISTS) {
-        return false;
-    }
-    WIN32_FIND_DATAW entry;
-    HANDLE search = FindFirstFileW((from + L"*").c_str(), &entry);
-    if (search == INVALID_HANDLE_VALUE) return false;
-    bool copied = true;
-    do {
-        std::wstring name = entry.cFileName;
-        if (name == L"." || name == L"..") continue;
-        if (entry.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) {
-            copied = CopyTree(from + name + L"\\", to + name + L"\\") && copied;
-        } else {
-            copied = CopyFileW((from + name).c_str(), (to + name).c_str(), FALSE) && copied;
-        }
-    } while (FindNextFileW(search, &entry));
-    FindClose(search);
-    return copied;
-}
-
-}  // namespace
-
 SampleDisc::SampleDisc() {
     wchar_t base[MAX_PATH];
     GetTempPathW(MAX_PATH, base);
@@ -405,12 +382,10 @@ SampleDisc::SampleDisc() {
     root_ = std::wstring(base) + L"Vemo disc-" + std::to_wstring(GetCurrentProcessId()) + L"-" +
             std::to_wstring(++counter) + L"\\";
     RemoveTree(root_);
-    wchar_t built[MAX_PATH * 2] = {};
-    GetFullPathNameW((TestProgramFolder() + L"..\\disc\\").c_str(), MAX_PATH * 2, built, nullptr);
-    EXPECT_NE(GetFileAttributesW((std::wstring(built) + L"AutoPlay.exe").c_str()),
-              INVALID_FILE_ATTRIBUTES)
-        << "the sample disc has not been built";
-    EXPECT_TRUE(CopyTree(built, root_)) << "the sample disc could not be copied";
+    std::error_code error;
+    std::filesystem::copy(TestProgramFolder() + L"..\\disc", root_,
+                          std::filesystem::copy_options::recursive, error);
+    EXPECT_FALSE(error) << "the built sample disc could not be copied: " << error.message();
 }
 
 SampleDisc::~SampleDisc() {
@@ -423,26 +398,14 @@ SampleDisc::~SampleDisc() {
 }
 
 void SampleDisc::SetEdition(int sku) const {
-    const std::string ini = "[SKU]\r\nSKU=" + std::to_string(sku) + "\r\n";
-    HANDLE file = CreateFileW(Path(L"ORVAK.INI").c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
-                              FILE_ATTRIBUTE_NORMAL, nullptr);
-    ASSERT_NE(file, INVALID_HANDLE_VALUE);
-    DWORD written = 0;
-    WriteFile(file, ini.data(), static_cast<DWORD>(ini.size()), &written, nullptr);
-    CloseHandle(file);
-    EXPECT_EQ(written, ini.size());
+    std::ofstream ini(std::filesystem::path(Path(L"ORVAK.INI")), std::ios::binary);
+    ini << "[SKU]\r\nSKU=" << sku << "\r\n";
+    EXPECT_TRUE(ini.flush()) << "ORVAK.INI could not be written";
 }
 
 void SampleDisc::Remove(const std::wstring& relativePath) const {
-    const std::wstring path = Path(relativePath);
-    const DWORD attributes = GetFileAttributesW(path.c_str());
-    ASSERT_NE(attributes, INVALID_FILE_ATTRIBUTES) << "nothing to remove";
-    if (attributes & FILE_ATTRIBUTE_DIRECTORY) {
-        RemoveTree(path);
-    } else {
-        DeleteFileW(path.c_str());
-    }
-    EXPECT_EQ(GetFileAttributesW(path.c_str()), INVALID_FILE_ATTRIBUTES);
+    std::error_code error;
+    EXPECT_GT(std::filesystem::remove_all(Path(relativePath), error), 0u) << "nothing to remove";
 }
 
 void SampleDisc::MoveAside(const std::wstring& relativePath) const {
@@ -469,16 +432,8 @@ CompanionLog::~CompanionLog() {
 
 std::vector<LogLine> CompanionLog::Lines() const {
     std::vector<LogLine> lines;
-    HANDLE file = CreateFileW(path_.c_str(), GENERIC_READ, FILE_SHARE_READ | FILE_SHARE_WRITE,
-                              nullptr, OPEN_EXISTING, FILE_ATTRIBUTE_NORMAL, nullptr);
-    if (file == INVALID_HANDLE_VALUE) return lines;
-    std::string bytes;
-    char chunk[4096];
-    DWORD read = 0;
-    while (ReadFile(file, chunk, sizeof(chunk), &read, nullptr) && read > 0) {
-        bytes.append(chunk, read);
-    }
-    CloseHandle(file);
+    std::ifstream file(std::filesystem::path(path_), std::ios::binary);
+    const std::string bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
     std::wstring text(bytes.size(), L'\0');
     text.resize(static_cast<std::size_t>(
         MultiByteToWideChar(CP_UTF8, 0, bytes.data(), static_cast<int>(bytes.size()), text.data(),
@@ -499,14 +454,12 @@ std::vector<LogLine> CompanionLog::Lines() const {
     return lines;
 }
 
-std::vector<LogLine> CompanionLog::WaitForLines(std::size_t count, DWORD timeoutMs) const {
+void CompanionLog::ExpectNext(const std::wstring& program, const std::wstring& arguments,
+                              const std::wstring& folder) {
     std::vector<LogLine> lines;
-    WaitUntil([&] { return (lines = Lines()).size() >= count; }, timeoutMs);
-    return lines;
-}
-
-void ExpectStarted(const LogLine& line, const std::wstring& program, const std::wstring& arguments,
-                   const std::wstring& folder) {
+    WaitUntil([&] { return (lines = Lines()).size() > checked_; }, kWindowWaitMs);
+    ASSERT_GT(lines.size(), checked_) << "nothing more was started";
+    const LogLine& line = lines[checked_++];
     ASSERT_EQ(line.size(), 3u);
     EXPECT_EQ(line[0], program);
     EXPECT_EQ(line[1], arguments);

@@ -161,16 +161,15 @@ class CompanionLog {
     CompanionLog& operator=(const CompanionLog&) = delete;
 
     std::vector<LogLine> Lines() const;
-    // Waits until at least `count` lines are there.
-    std::vector<LogLine> WaitForLines(std::size_t count, DWORD timeoutMs = kWindowWaitMs) const;
+    // Waits for the line after those already checked, and checks it. Folders compare as
+    // Windows compares them: in any case, with or without a final backslash.
+    void ExpectNext(const std::wstring& program, const std::wstring& arguments,
+                    const std::wstring& folder);
 
   private:
     std::wstring path_;
+    std::size_t checked_ = 0;
 };
-
-// Folders compare as Windows compares them: in any case, with or without a final backslash.
-void ExpectStarted(const LogLine& line, const std::wstring& program, const std::wstring& arguments,
-                   const std::wstring& folder);
 
 // The launcher on its own copy of the sample disc (edition 1), with the product's and the
 // locale's keys gone before and after. Whatever the launcher, the programs it started or the

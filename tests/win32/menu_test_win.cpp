@@ -65,10 +65,6 @@ Rgb Composite(Rgb a, Rgb b, std::uint8_t m) {
     return {mix(a.r, b.r), mix(a.g, b.g), mix(a.b, b.b)};
 }
 
-LRESULT CALLBACK ParentProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    return DefWindowProcW(window, message, wParam, lParam);
-}
-
 BOOL CALLBACK CountWindow(HWND, LPARAM count) {
     ++*reinterpret_cast<int*>(count);
     return TRUE;
@@ -92,7 +88,7 @@ class MenuTest : public testing::Test {
         disc.WriteFile(FindLanguage(kUsEnglish)->backgroundFile, PatternBmpFile(640, 480));
         LoadCatalogue();
         WNDCLASSW parentClass{};
-        parentClass.lpfnWndProc = ParentProc;
+        parentClass.lpfnWndProc = DefWindowProcW;
         parentClass.hInstance = launcher.instance;
         parentClass.lpszClassName = L"MenuTestParent";
         RegisterClassW(&parentClass);
@@ -124,10 +120,10 @@ class MenuTest : public testing::Test {
         }
         return nullptr;
     }
-    std::vector<std::uint32_t> Ids(std::int32_t page, bool onlyVisible = false) {
+    std::vector<std::uint32_t> VisibleIds(std::int32_t page) {
         std::vector<std::uint32_t> ids;
         for (LauncherButton* button : menu->pages[static_cast<std::size_t>(page)]) {
-            if (!onlyVisible || button->visible) ids.push_back(button->id);
+            if (button->visible) ids.push_back(button->id);
         }
         return ids;
     }
@@ -459,7 +455,7 @@ TEST_F(MenuTest, BeforeTheMainMenuExistsTheCheckChangesNoButton) {
     menu->StartLanguageList(parent);
     EXPECT_TRUE(menu->installed);
     EXPECT_EQ(menu->installIndex, -1);
-    EXPECT_EQ(Ids(LanguagePage, true), (std::vector<std::uint32_t>{500, 506}));
+    EXPECT_EQ(VisibleIds(LanguagePage), (std::vector<std::uint32_t>{500, 506}));
 }
 
 }  // namespace
