@@ -68,19 +68,6 @@ class Painting : public testing::Test {
     TempFolder disc;
 };
 
-TEST_F(Painting, WorkingCopyComesFromTheFirstLanguageBackground) {
-    WriteBackground(kGerman);
-    WriteBackground(kJapanese);
-    LoadBackgrounds();
-    EXPECT_EQ(launcher.backgroundWidth, 640);
-    EXPECT_EQ(launcher.backgroundHeight, 480);
-    EXPECT_EQ(catalogue.firstBackgroundKey, static_cast<std::int32_t>(kGerman));
-    EXPECT_NE(BackgroundFor(kJapanese), nullptr);
-    EXPECT_EQ(BackgroundFor(kUsEnglish), nullptr);
-    // The working copy is a picture of its own.
-    EXPECT_NE(launcher.workingBackground.get(), BackgroundFor(kGerman));
-}
-
 TEST_F(Painting, CorruptOrMismatchedBackgroundsCountAsMissing) {
     WriteBackground(kUsEnglish);
     WriteBackground(kFrench, 320, 240);  // not the window's size
