@@ -4,45 +4,22 @@
 // something is missing. The disc lives in a folder whose name has spaces.
 #include <gtest/gtest.h>
 #include <windows.h>
-// After windows.h, whose types it uses.
-#include <tlhelp32.h>
 
 #include <cstdio>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
 #include <optional>
 #include <string>
 #include <vector>
 
-#include "e2e_support_win.h"
 #include "launcher_driver_win.h"
 #include "locale/config_win.h"
-#include "sample_disc_win.h"
 #include "shell_associations_win.h"
 #include "test_support_win.h"
 
 namespace {
-
-using LogLine = std::vector<std::wstring>;
-
-// The windows of the programs the commands start. Each test closes them before its next
-// click, so that none lies over the launcher's buttons; whatever a failing test leaves open
-// is closed when it ends.
-const wchar_t* const kStartedWindowClasses[] = {L"Brask", L"VemoCreatorWindow", L"TrivexWindow",
-                                                L"KelpaWindow", L"Notepad"};
-
-// Folders compare as Windows compares them: in any case, with or without a final backslash.
-bool SameFolder(std::wstring a, std::wstring b) {
-    if (!a.empty() && a.back() == L'\\') a.pop_back();
-    if (!b.empty() && b.back() == L'\\') b.pop_back();
-    return SameTextIgnoringCase(a, b);
-}
-
-void ExpectStarted(const LogLine& line, const std::wstring& program, const std::wstring& arguments,
-                   const std::wstring& folder) {
-    ASSERT_EQ(line.size(), 3u);
-    EXPECT_EQ(line[0], program);
-    EXPECT_EQ(line[1], arguments);
-    EXPECT_TRUE(SameFolder(line[2], folder)) << "started in " << line[2] << ", not in " << folder;
-}
 
 std::wstring Quoted(const std::wstring& text) {
     return L"\"" + text + L"\"";
@@ -58,22 +35,12 @@ std::wstring ProcessImage(DWORD processId) {
     return std::wstring(path, length);
 }
 
-std::wstring WindowText(HWND window) {
-    wchar_t text[256] = {};
-    GetWindowTextW(window, text, 256);
-    return text;
-}
-
 // The text of a UTF-16 file with a byte-order mark, as the disc's readme files are written.
 std::wstring Utf16File(const std::wstring& path) {
-    HANDLE file = CreateFileW(path.c_str(), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING,
-                              FILE_ATTRIBUTE_NORMAL, nullptr);
-    if (file == INVALID_HANDLE_VALUE) return L"";
-    std::wstring text(GetFileSize(file, nullptr) / sizeof(wchar_t), L'\0');
-    DWORD read = 0;
-    ReadFile(file, text.data(), static_cast<DWORD>(text.size() * sizeof(wchar_t)), &read, nullptr);
-    CloseHandle(file);
-    text.resize(read / sizeof(wchar_t));
+    std::ifstream file(std::filesystem::path(path), std::ios::binary);
+    const std::string bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    std::wstring text(bytes.size() / sizeof(wchar_t), L'\0');
+    std::memcpy(text.data(), bytes.data(), text.size() * sizeof(wchar_t));
     if (!text.empty() && text[0] == 0xFEFF) text.erase(0, 1);
     return text;
 }
@@ -96,83 +63,8 @@ std::wstring SystemNotepad() {
     return std::wstring(folder) + L"\\notepad.exe";
 }
 
-class Commands : public testing::Test {
+class Commands : public LauncherTest {
   protected:
-    void SetUp() override {
-        DeleteMachineKey(kProductKeyPath);
-        DeleteMachineKey(kUninstallKeyPath);
-        DeleteMachineKey(kLocaleKeyPath);
-    }
-    void TearDown() override {
-        CloseStartedPrograms();
-        EndLauncher();
-        DeleteMachineKey(kLocaleKeyPath);
-        // The folders the product's keys live in, once they are empty.
-        RegDeleteKeyW(HKEY_LOCAL_MACHINE, L"Software\\Orvak\\The Vemo Vodizuri");
-        RegDeleteKeyW(HKEY_LOCAL_MACHINE, L"Software\\Orvak");
-    }
-
-    // Starts the launcher on the disc (in `folder`, the disc's root when empty) and waits for
-    // its first settled frame.
-    bool Start(const std::wstring& arguments, const std::wstring& folder = L"") {
-        window = nullptr;
-        if (!launcher.Start(disc.Launcher(), arguments, folder.empty() ? disc.Root() : folder)) {
-            return false;
-        }
-        window = WaitForWindow(launcher.Id(), L"LauncherAppClass");
-        if (!window) {
-            ADD_FAILURE() << "the launcher showed no window";
-            return false;
-        }
-        SettledShot(window);
-        return true;
-    }
-
-    // Clicks the button carrying `id` with the real mouse, in its middle.
-    bool Press(int id) {
-        HWND button = nullptr;
-        if (!WaitUntil([&] { return (button = VisibleButton(window, id)) != nullptr; }, 5000)) {
-            ADD_FAILURE() << "no visible button " << id;
-            return false;
-        }
-        RECT place{};
-        GetWindowRect(button, &place);
-        POINT middle{(place.left + place.right) / 2, (place.top + place.bottom) / 2};
-        if (!WaitUntil([&] { return WindowFromPoint(middle) == button; }, 5000)) {
-            ADD_FAILURE() << "something lies over button " << id;
-            return false;
-        }
-        ScreenToClient(window, &middle);
-        Click(window, middle);
-        return true;
-    }
-
-    // Opens the fold-out panel of `opener` unless `id` already shows, then presses `id`.
-    bool PressInPanel(int opener, int id) {
-        if (!VisibleButton(window, id) && !Press(opener)) return false;
-        return Press(id);
-    }
-
-    bool StillRunning() { return !launcher.WaitForExit(0).has_value() && IsWindow(window); }
-
-    void EndLauncher() {
-        for (HWND main : TopLevelWindows(launcher.Id(), L"LauncherAppClass")) {
-            PostMessageW(main, WM_CLOSE, 0, 0);
-        }
-        launcher.WaitForExit(kWindowWaitMs);
-    }
-
-    // Waits for the window a started program shows (it logs before it makes its window), and
-    // closes it.
-    static void CloseWindowOf(const wchar_t* className) {
-        HWND started = nullptr;
-        ASSERT_TRUE(WaitUntil(
-            [&] { return (started = FindWindowW(className, nullptr)) != nullptr; }, kWindowWaitMs))
-            << "no window of class " << className;
-        PostMessageW(started, WM_CLOSE, 0, 0);
-        EXPECT_TRUE(WaitUntil([&] { return !IsWindow(started); }, kWindowWaitMs));
-    }
-
     // Waits for Notepad, and checks that it is the system folder's and shows `file`.
     void ExpectSystemNotepadShowing(const std::wstring& file) {
         HWND notepad = nullptr;
@@ -183,21 +75,12 @@ class Commands : public testing::Test {
         GetWindowThreadProcessId(notepad, &processId);
         const std::wstring image = ProcessImage(processId);
         EXPECT_TRUE(SameTextIgnoringCase(image, SystemNotepad())) << image;
-        // The window shows before the file is read into it.
+        // The window shows before the file is read into it, on a loaded machine seconds before.
         HWND edit = FindWindowExW(notepad, nullptr, L"Edit", nullptr);
         const std::wstring text = Utf16File(file);
         EXPECT_TRUE(WaitUntil([&] { return EditText(edit) == text; }, kWindowWaitMs))
-            << "Notepad shows " << WindowText(notepad);
-        CloseWindowOf(L"Notepad");
-    }
-
-    static void CloseStartedPrograms() {
-        for (const wchar_t* className : kStartedWindowClasses) {
-            while (HWND started = FindWindowW(className, nullptr)) {
-                PostMessageW(started, WM_CLOSE, 0, 0);
-                if (!WaitUntil([&] { return !IsWindow(started); }, kWindowWaitMs)) break;
-            }
-        }
+            << "Notepad shows " << TextOfWindow(notepad);
+        EXPECT_TRUE(CloseWindowOf(L"Notepad"));
     }
 
     // The disc's installer swapped for the logging viewer, which ends at once: the commands'
@@ -207,21 +90,7 @@ class Commands : public testing::Test {
             CopyFileW(ViewerProgram().c_str(), disc.Path(L"Setup\\setup.exe").c_str(), FALSE));
     }
 
-    // Takes a disc file away for a while, and puts it back.
-    void MoveAside(const std::wstring& relativePath) const {
-        ASSERT_TRUE(
-            MoveFileW(disc.Path(relativePath).c_str(), disc.Path(relativePath + L".away").c_str()));
-    }
-    void PutBack(const std::wstring& relativePath) const {
-        ASSERT_TRUE(
-            MoveFileW(disc.Path(relativePath + L".away").c_str(), disc.Path(relativePath).c_str()));
-    }
-
-    SampleDisc disc{L"Vemo disc"};
-    CompanionLog log;
     ShellAssociations shell;
-    TestProcess launcher;
-    HWND window = nullptr;
 };
 
 // The game as its installer leaves it, in a folder of its own: the product key's values and
@@ -257,79 +126,56 @@ class InstalledGame {
 struct LanguageRow {
     const wchar_t* option;
     const wchar_t* installerParameters;
-    const wchar_t* readme;  // in the disc's Support folder
+    const wchar_t* readme;   // in the disc's Support folder
+    const wchar_t* address;  // as the browser is given it
 };
 
-// Every language's installer id and readme.
+// Every language's installer id, readme and regional site. The bare host names reach the
+// browser as http addresses: the shell takes a bare name for a web address only when it starts
+// with "www.", any other host would show "Can't run browser" instead of its site.
 const LanguageRow kLanguageRows[] = {
-    {L"-l0409", L"-l0009", L"readme.txt"},   {L"-l040c", L"-l040c", L"Lisezmoi.txt"},
-    {L"-l0407", L"-l0007", L"Liesmich.txt"}, {L"-l041d", L"-l001d", L"Lasmig.TXT"},
-    {L"-l0413", L"-l0013", L"Leesmij.txt"},  {L"-l0416", L"-l0416", L"Leia-me.txt"},
-    {L"-l0c0a", L"-l000a", L"Leeme.txt"},    {L"-l0410", L"-l0010", L"Leggimi.txt"},
-    {L"-l0415", L"-l0015", L"ReadmeP.txt"},  {L"-l0411", L"-l0011", L"readmeJ.txt"},
-    {L"-l0404", L"-l0404", L"readmeTC.txt"}, {L"-l0804", L"-l0804", L"readmeSC.txt"},
-    {L"-l041e", L"-l001e", L"readmeTh.txt"}, {L"-l0412", L"-l0012", L"readmeKo.txt"},
-    {L"-l0809", L"-l0009", L"readmeUK.txt"}, {L"-l0414", L"-l0014", L"readmeNO.txt"},
-    {L"-l040b", L"-l000b", L"readmeFI.txt"}, {L"-l0406", L"-l0006", L"readmeDN.txt"},
+    {L"-l0409", L"-l0009", L"readme.txt", L"http://www.vemo.example"},
+    {L"-l040c", L"-l040c", L"Lisezmoi.txt", L"http://www.fr.vemo.example"},
+    {L"-l0407", L"-l0007", L"Liesmich.txt", L"http://www.de.vemo.example"},
+    {L"-l041d", L"-l001d", L"Lasmig.TXT", L"http://www.se.vemo.example"},
+    {L"-l0413", L"-l0013", L"Leesmij.txt", L"http://www.nl.vemo.example"},
+    {L"-l0416", L"-l0416", L"Leia-me.txt", L"http://www.br.vemo.example"},
+    {L"-l0c0a", L"-l000a", L"Leeme.txt", L"http://www.es.vemo.example"},
+    {L"-l0410", L"-l0010", L"Leggimi.txt", L"http://www.it.vemo.example"},
+    {L"-l0415", L"-l0015", L"ReadmeP.txt", L"http://www.vemo.example"},
+    {L"-l0411", L"-l0011", L"readmeJ.txt", L"http://www.jp.vemo.example"},
+    {L"-l0404", L"-l0404", L"readmeTC.txt", L"http://www.tw.vemo.example"},
+    {L"-l0804", L"-l0804", L"readmeSC.txt", L"http://www.vemo.example"},
+    {L"-l041e", L"-l001e", L"readmeTh.txt", L"http://www.vemo.example"},
+    {L"-l0412", L"-l0012", L"readmeKo.txt", L"http://kr.vemo.example/index.html"},
+    {L"-l0809", L"-l0009", L"readmeUK.txt", L"http://www.uk.vemo.example"},
+    {L"-l0414", L"-l0014", L"readmeNO.txt", L"http://www.no.vemo.example"},
+    {L"-l040b", L"-l000b", L"readmeFI.txt", L"http://www.vemo.example"},
+    {L"-l0406", L"-l0006", L"readmeDN.txt", L"http://www.dk.vemo.example"},
 };
 
-TEST_F(Commands, EachLanguageInstallsAndOpensItsReadmeInTheSystemNotepad) {
+TEST_F(Commands, EachLanguageInstallsOpensItsReadmeInTheSystemNotepadAndItsRegionalSite) {
     UseViewerAsInstaller();
-    std::size_t logged = 0;
+    shell.OpenEverythingWithViewer();
     for (const LanguageRow& row : kLanguageRows) {
         SCOPED_TRACE(testing::Message() << "launcher " << row.option);
         ASSERT_TRUE(Start(row.option));
 
         ASSERT_TRUE(Press(101));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), L"setup.exe", row.installerParameters, disc.Path(L"Setup"));
+        log.ExpectNext(L"setup.exe", row.installerParameters, disc.Path(L"Setup"));
 
         ASSERT_TRUE(PressInPanel(108, 301));
         ExpectSystemNotepadShowing(disc.Path(L"Support\\") + row.readme);
 
-        EXPECT_TRUE(StillRunning());
-        EndLauncher();
-    }
-}
-
-struct SiteRow {
-    const wchar_t* option;
-    const wchar_t* address;  // as the browser is given it
-};
-
-// The fourteen regional sites: the bare host names reach the browser as http addresses.
-const SiteRow kSiteRows[] = {
-    {L"-l0409", L"http://www.vemo.example"}, {L"-l040c", L"http://www.fr.vemo.example"},
-    {L"-l0407", L"http://www.de.vemo.example"},  {L"-l041d", L"http://www.se.vemo.example"},
-    {L"-l0413", L"http://www.nl.vemo.example"},  {L"-l0416", L"http://www.br.vemo.example"},
-    {L"-l0c0a", L"http://www.es.vemo.example"},  {L"-l0410", L"http://www.it.vemo.example"},
-    {L"-l0415", L"http://www.vemo.example"}, {L"-l0411", L"http://www.jp.vemo.example"},
-    {L"-l0404", L"http://www.tw.vemo.example"},  {L"-l0804", L"http://www.vemo.example"},
-    {L"-l041e", L"http://www.vemo.example"}, {L"-l0412", L"http://kr.vemo.example/index.html"},
-    {L"-l0809", L"http://www.uk.vemo.example"},  {L"-l0414", L"http://www.no.vemo.example"},
-    {L"-l040b", L"http://www.vemo.example"}, {L"-l0406", L"http://www.dk.vemo.example"},
-};
-
-// The shell takes a bare name for a web address only when it starts with "www."; any other host
-// would show "Can't run browser" instead of its site.
-TEST_F(Commands, EachLanguageOpensItsRegionalWebSiteAndKeepsRunning) {
-    shell.OpenEverythingWithViewer();
-    std::size_t logged = 0;
-    for (const SiteRow& row : kSiteRows) {
-        SCOPED_TRACE(testing::Message() << "launcher " << row.option);
-        ASSERT_TRUE(Start(row.option));
         ASSERT_TRUE(Press(107));
         if (std::optional<MessageBoxSeen> box = WaitForMessageBox(launcher.Id(), 1000)) {
             ADD_FAILURE() << "the launcher said: " << box->caption;
             PressButton(*box, IDOK);
         } else {
-            auto lines = log.WaitForLines(++logged);
-            ASSERT_EQ(lines.size(), logged);
-            ExpectStarted(lines.back(), L"viewer.exe", Quoted(row.address), disc.Root());
+            log.ExpectNext(L"viewer.exe", Quoted(row.address), disc.Root());
         }
         EXPECT_TRUE(StillRunning());
-        EndLauncher();
+        CloseLauncher();
     }
 }
 
@@ -355,10 +201,8 @@ TEST_F(Commands, ReadmeOpensTheSystemNotepadNotOnePlantedOnTheDiscOrInTheCurrent
 
     // Anything started by the readme command has logged long before the web site's browser.
     ASSERT_TRUE(Press(107));
-    auto lines = log.WaitForLines(1);
-    ASSERT_EQ(lines.size(), 1u) << "a planted notepad.exe ran";
-    ExpectStarted(lines[0], L"viewer.exe", L"\"http://www.vemo.example\"", current.Path());
-    EndLauncher();  // it holds on to its current folder
+    log.ExpectNext(L"viewer.exe", L"\"http://www.vemo.example\"", current.Path());
+    CloseLauncher();  // it holds on to its current folder
 }
 
 TEST_F(Commands, InformationPanelStartsTheSupportToolOrHelpPageAndTheRegistration) {
@@ -377,26 +221,23 @@ TEST_F(Commands, InformationPanelStartsTheSupportToolOrHelpPageAndTheRegistratio
         {2, L"-l040c", L"viewer.exe", L"\"IX_Help_Fr.htm\"", L"Support\\ix help\\fr-fr", nullptr},
         {6, L"-l0409", L"viewer.exe", L"\"IX_Help_Select.htm\"", L"Support\\ix help", nullptr},
     };
-    std::size_t logged = 0;
     for (const Row& row : rows) {
         SCOPED_TRACE(testing::Message() << "edition " << row.edition << ", " << row.option);
         disc.SetEdition(row.edition);
         ASSERT_TRUE(Start(row.option));
 
         ASSERT_TRUE(PressInPanel(108, 302));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), row.program, row.arguments, disc.Path(row.folder));
-        if (row.windowClass) CloseWindowOf(row.windowClass);
+        log.ExpectNext(row.program, row.arguments, disc.Path(row.folder));
+        if (row.windowClass) {
+            EXPECT_TRUE(CloseWindowOf(row.windowClass));
+        }
 
         ASSERT_TRUE(PressInPanel(108, 303));
-        lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), L"Kelpa.exe", L"", disc.Path(L"Support"));
-        CloseWindowOf(L"KelpaWindow");
+        log.ExpectNext(L"Kelpa.exe", L"", disc.Path(L"Support"));
+        EXPECT_TRUE(CloseWindowOf(L"KelpaWindow"));
 
         EXPECT_TRUE(StillRunning());
-        EndLauncher();
+        CloseLauncher();
     }
 }
 
@@ -405,13 +246,10 @@ TEST_F(Commands, DemosOpenInTheAssociatedPlayerFromTheDemosFolder) {
     ASSERT_TRUE(Start(L"-l0409"));
     const std::pair<int, const wchar_t*> demos[] = {
         {601, L"vemo2.mpg"}, {602, L"vemo2duskaro.mpg"}, {603, L"vemo2lorrel.mpg"}};
-    std::size_t logged = 0;
     for (const auto& [id, file] : demos) {
         SCOPED_TRACE(id);
         ASSERT_TRUE(PressInPanel(103, id));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), L"viewer.exe", Quoted(file), disc.Path(L"Demos"));
+        log.ExpectNext(L"viewer.exe", Quoted(file), disc.Path(L"Demos"));
     }
     EXPECT_TRUE(WaitForMessageBox(launcher.Id(), 1000) == std::nullopt);
     EXPECT_TRUE(StillRunning());
@@ -425,24 +263,24 @@ TEST_F(Commands, PlayCommandsStartTheGameOrCreatorAndEndTheLauncher) {
         const wchar_t* arguments;
         bool inCreatorFolder;
         const wchar_t* windowClass;
+        const wchar_t* title;
     };
     const Row rows[] = {
-        {150, L"Vemo.exe", L"", false, L"Brask"},
-        {151, L"Vemo.exe", L"-r1024x768", false, L"Brask"},
-        {152, L"TheVemoCreator.exe", L"", true, L"VemoCreatorWindow"},
+        {150, L"Vemo.exe", L"", false, L"Brask", L"The Vemo"},
+        {151, L"Vemo.exe", L"-r1024x768", false, L"Brask", L"The Vemo"},
+        {152, L"TheVemoCreator.exe", L"", true, L"VemoCreatorWindow", L"The Vemo Creator"},
     };
-    std::size_t logged = 0;
     for (const Row& row : rows) {
         SCOPED_TRACE(row.id);
         ASSERT_TRUE(Start(L"-l0409"));
         ASSERT_TRUE(PressInPanel(102, row.id));
         EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-        auto lines = log.WaitForLines(++logged);
-        ASSERT_EQ(lines.size(), logged);
-        ExpectStarted(lines.back(), row.program, row.arguments,
-                      row.inCreatorFolder ? game.CreatorFolder() : game.GameFolder());
-        // The game's window stops the next launcher from starting.
-        CloseWindowOf(row.windowClass);
+        log.ExpectNext(row.program, row.arguments,
+                       row.inCreatorFolder ? game.CreatorFolder() : game.GameFolder());
+        // The launcher knows the game's window by its class and title; while it is open the
+        // next launcher ends at once.
+        EXPECT_TRUE(WaitUntil([&] { return FindWindowW(row.windowClass, row.title) != nullptr; }));
+        EXPECT_TRUE(CloseWindowOf(row.windowClass));
     }
 }
 
@@ -473,53 +311,8 @@ TEST_F(Commands, PlayCommandsStartNothingOnceTheGameIsGone) {
         EXPECT_EQ(VisibleButton(window, 102), nullptr);
         EXPECT_EQ(VisibleButton(window, 150), nullptr);
         EXPECT_TRUE(log.Lines().empty()) << "something was started";
-        EndLauncher();
+        CloseLauncher();
     }
-}
-
-TEST_F(Commands, WithoutDiscOneEveryDiscCommandAsksUntilCancelledAndTheRestNeverAsk) {
-    UseViewerAsInstaller();
-    shell.OpenEverythingWithViewer();
-    MoveAside(L"Setup\\data2.cab");
-    ASSERT_TRUE(Start(L"-l0409"));
-    const std::pair<int, int> asking[] = {{0, 101},   {108, 301}, {108, 302}, {108, 303},
-                                          {103, 601}, {103, 602}, {103, 603}};
-    for (const auto& [opener, id] : asking) {
-        SCOPED_TRACE(id);
-        ASSERT_TRUE(opener ? PressInPanel(opener, id) : Press(id));
-        for (int answer : {IDOK, IDCANCEL}) {
-            std::optional<MessageBoxSeen> prompt = WaitForMessageBox(launcher.Id());
-            ASSERT_TRUE(prompt) << "no prompt for Disc 1";
-            EXPECT_EQ(prompt->caption, L"Insert Disc 1");
-            EXPECT_EQ(prompt->text,
-                      L"To continue with this operation, please insert Disc 1 into the CD-ROM "
-                      L"drive and click OK.");
-            EXPECT_EQ(prompt->buttons, (std::vector<int>{IDOK, IDCANCEL}));
-            ASSERT_TRUE(PressButton(*prompt, answer));
-        }
-        EXPECT_TRUE(StillRunning());
-    }
-
-    // OK once the disc is back carries on with the command.
-    ASSERT_TRUE(Press(101));
-    std::optional<MessageBoxSeen> prompt = WaitForMessageBox(launcher.Id());
-    ASSERT_TRUE(prompt);
-    PutBack(L"Setup\\data2.cab");
-    ASSERT_TRUE(PressButton(*prompt, IDOK));
-    auto lines = log.WaitForLines(1);
-    ASSERT_EQ(lines.size(), 1u);
-    ExpectStarted(lines[0], L"setup.exe", L"-l0009", disc.Path(L"Setup"));
-
-    // The web site and Exit never ask for the disc.
-    MoveAside(L"Setup\\data2.cab");
-    ASSERT_TRUE(Press(107));
-    lines = log.WaitForLines(2);
-    ASSERT_EQ(lines.size(), 2u) << "a cancelled command started something";
-    ExpectStarted(lines[1], L"viewer.exe", L"\"http://www.vemo.example\"", disc.Root());
-    EXPECT_TRUE(WaitForMessageBox(launcher.Id(), 1000) == std::nullopt);
-    ASSERT_TRUE(Press(110));
-    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_EQ(log.Lines().size(), 2u);
 }
 
 struct Messages {
@@ -549,6 +342,45 @@ const Messages kMessages[] = {
      L"Nie można uruchomić wersji demo",
      L"Przepraszamy.  Nie można odnaleźć wersji demo %s na tej płycie CD."},
 };
+const std::vector<int> kOkCancel = {IDOK, IDCANCEL};
+const std::vector<int> kOk = {IDOK};
+
+TEST_F(Commands, WithoutDiscOneEveryDiscCommandAsksUntilCancelledAndTheRestNeverAsk) {
+    UseViewerAsInstaller();
+    shell.OpenEverythingWithViewer();
+    disc.MoveAside(L"Setup\\data2.cab");
+    ASSERT_TRUE(Start(L"-l0409"));
+    const Messages& english = kMessages[0];
+    const std::pair<int, int> asking[] = {{0, 101},   {108, 301}, {108, 302}, {108, 303},
+                                          {103, 601}, {103, 602}, {103, 603}};
+    for (const auto& [opener, id] : asking) {
+        SCOPED_TRACE(id);
+        ASSERT_TRUE(opener ? PressInPanel(opener, id) : Press(id));
+        // OK with the disc still missing asks again; Cancel drops the command.
+        for (int answer : {IDOK, IDCANCEL}) {
+            AnswerMessageBox(launcher.Id(), english.discCaption, english.discText, kOkCancel,
+                             answer);
+        }
+        EXPECT_TRUE(StillRunning());
+    }
+
+    // OK once the disc is back carries on with the command.
+    ASSERT_TRUE(Press(101));
+    std::optional<MessageBoxSeen> prompt = WaitForMessageBox(launcher.Id());
+    ASSERT_TRUE(prompt);
+    disc.PutBack(L"Setup\\data2.cab");
+    ASSERT_TRUE(PressButton(*prompt, IDOK));
+    log.ExpectNext(L"setup.exe", L"-l0009", disc.Path(L"Setup"));
+
+    // The web site and Exit never ask for the disc.
+    disc.MoveAside(L"Setup\\data2.cab");
+    ASSERT_TRUE(Press(107));
+    log.ExpectNext(L"viewer.exe", L"\"http://www.vemo.example\"", disc.Root());
+    EXPECT_TRUE(WaitForMessageBox(launcher.Id(), 1000) == std::nullopt);
+    ASSERT_TRUE(Press(110));
+    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+    EXPECT_EQ(log.Lines().size(), 2u);
+}
 
 std::wstring WithFile(const wchar_t* format, const std::wstring& file) {
     std::wstring text = format;
@@ -559,86 +391,41 @@ std::wstring WithFile(const wchar_t* format, const std::wstring& file) {
 TEST_F(Commands, FailuresAreToldInTheLanguageOfTheMenu) {
     for (const Messages& expected : kMessages) {
         SCOPED_TRACE(testing::Message() << "launcher " << expected.option);
-        MoveAside(L"Setup\\data2.cab");
+        disc.MoveAside(L"Setup\\data2.cab");
         ASSERT_TRUE(Start(expected.option));
-        auto expectBox = [&](const wchar_t* caption, const std::wstring& text, int answer) {
-            std::optional<MessageBoxSeen> box = WaitForMessageBox(launcher.Id());
-            ASSERT_TRUE(box) << "nothing was said";
-            EXPECT_EQ(box->caption, caption);
-            EXPECT_EQ(box->text, text);
-            ASSERT_TRUE(PressButton(*box, answer));
-        };
-
+        const DWORD id = launcher.Id();
         ASSERT_TRUE(Press(101));
-        expectBox(expected.discCaption, expected.discText, IDCANCEL);
-        PutBack(L"Setup\\data2.cab");
+        AnswerMessageBox(id, expected.discCaption, expected.discText, kOkCancel, IDCANCEL);
+        disc.PutBack(L"Setup\\data2.cab");
 
         // Nothing opens web addresses (Wine's shell answers "no association", 31), then a
         // program that is not there does (it answers "file not found").
         ASSERT_TRUE(Press(107));
-        expectBox(expected.noBrowserCaption, expected.noBrowserText, IDOK);
+        AnswerMessageBox(id, expected.noBrowserCaption, expected.noBrowserText, kOk, IDOK);
         shell.OpenWebAddressesWith(TestProgramFolder() + L"no-such-browser.exe");
         ASSERT_TRUE(Press(107));
-        expectBox(expected.browserFailedCaption, expected.browserFailedText, IDOK);
+        AnswerMessageBox(id, expected.browserFailedCaption, expected.browserFailedText, kOk, IDOK);
         shell.ForgetWebAddresses();
 
         // A demo missing from the disc, then a demo with no player for it.
         shell.OpenFilesWith(L".mpg", ViewerProgram());
-        MoveAside(L"Demos\\vemo2.mpg");
+        disc.MoveAside(L"Demos\\vemo2.mpg");
         ASSERT_TRUE(PressInPanel(103, 601));
-        expectBox(expected.demoCaption, WithFile(expected.demoText, L"vemo2.mpg"), IDOK);
-        PutBack(L"Demos\\vemo2.mpg");
+        AnswerMessageBox(id, expected.demoCaption, WithFile(expected.demoText, L"vemo2.mpg"), kOk,
+                         IDOK);
+        disc.PutBack(L"Demos\\vemo2.mpg");
         shell.ForgetFiles(L".mpg");
         ASSERT_TRUE(PressInPanel(103, 602));
-        expectBox(expected.demoCaption, WithFile(expected.demoText, L"vemo2duskaro.mpg"), IDOK);
+        AnswerMessageBox(id, expected.demoCaption, WithFile(expected.demoText, L"vemo2duskaro.mpg"),
+                         kOk, IDOK);
 
         EXPECT_TRUE(StillRunning());
         EXPECT_TRUE(log.Lines().empty());
-        EndLauncher();
+        CloseLauncher();
     }
 }
 
-// The processor time so far of a process's threads, in milliseconds. Wine keeps no running
-// total for another process, but reads each thread's time from the system.
-double ProcessorMs(DWORD processId) {
-    HANDLE snapshot = CreateToolhelp32Snapshot(TH32CS_SNAPTHREAD, 0);
-    if (snapshot == INVALID_HANDLE_VALUE) return 0;
-    auto ms = [](const FILETIME& t) {
-        return static_cast<double>(static_cast<ULONGLONG>(t.dwHighDateTime) << 32 |
-                                   t.dwLowDateTime) /
-               10000.0;
-    };
-    double total = 0;
-    THREADENTRY32 entry{};
-    entry.dwSize = sizeof(entry);
-    for (BOOL more = Thread32First(snapshot, &entry); more; more = Thread32Next(snapshot, &entry)) {
-        if (entry.th32OwnerProcessID != processId) continue;
-        HANDLE thread = OpenThread(THREAD_QUERY_LIMITED_INFORMATION, FALSE, entry.th32ThreadID);
-        if (!thread) continue;
-        FILETIME created, ended, kernel, user;
-        if (GetThreadTimes(thread, &created, &ended, &kernel, &user))
-            total += ms(kernel) + ms(user);
-        CloseHandle(thread);
-    }
-    CloseHandle(snapshot);
-    return total;
-}
-
-// Alt+Space opens a window's system menu, as the keyboard sends it.
-void OpenSystemMenu() {
-    INPUT keys[4] = {};
-    const WORD codes[4] = {VK_MENU, VK_SPACE, VK_SPACE, VK_MENU};
-    for (int i = 0; i < 4; ++i) {
-        keys[i].type = INPUT_KEYBOARD;
-        keys[i].ki.wVk = codes[i];
-        keys[i].ki.wScan = static_cast<WORD>(MapVirtualKeyW(codes[i], MAPVK_VK_TO_VSC));
-        keys[i].ki.dwFlags = i >= 2 ? KEYEVENTF_KEYUP : 0;
-    }
-    SendInput(4, keys, sizeof(INPUT));
-    Sleep(300);
-}
-
-TEST_F(Commands, AboutBoxShowsItsPictureAndLeavesTheLauncherIdle) {
+TEST_F(Commands, AboutBoxShowsItsPictureLeavesTheLauncherIdleAndClosesButNotWithEscape) {
     ASSERT_TRUE(Start(L"-l0409"));
     ASSERT_TRUE(Press(1000));
     HWND box = WaitForWindow(launcher.Id(), L"#32770");
@@ -652,21 +439,19 @@ TEST_F(Commands, AboutBoxShowsItsPictureAndLeavesTheLauncherIdle) {
     MapWindowPoints(nullptr, box, reinterpret_cast<POINT*>(&place), 2);
     EXPECT_EQ(place.right - place.left, 400);
     EXPECT_EQ(place.bottom - place.top, 488);
-    EXPECT_EQ(WindowText(GetDlgItem(box, IDOK)), L"&OK");
+    EXPECT_EQ(TextOfWindow(GetDlgItem(box, IDOK)), L"&OK");
 
     // Picture 241 of the launcher's resources is what the box shows.
     const Screenshot shot = SettledShot(box);
     shot.SaveForReadme(L"about");
     HMODULE program = LoadLibraryExW(disc.Launcher().c_str(), nullptr,
                                      LOAD_LIBRARY_AS_DATAFILE | LOAD_LIBRARY_AS_IMAGE_RESOURCE);
-    ASSERT_TRUE(program);
     HBITMAP resource = static_cast<HBITMAP>(
         LoadImageW(program, MAKEINTRESOURCEW(241), IMAGE_BITMAP, 0, 0, LR_CREATEDIBSECTION));
     ASSERT_TRUE(resource);
     const Screenshot expected(resource);
     DeleteObject(resource);
     FreeLibrary(program);
-    ASSERT_EQ(expected.Width(), 400);
     int differing = 0;
     for (int y = 0; y < expected.Height(); y += 8) {
         for (int x = 0; x < expected.Width(); x += 8) {
@@ -676,7 +461,9 @@ TEST_F(Commands, AboutBoxShowsItsPictureAndLeavesTheLauncherIdle) {
     }
     EXPECT_EQ(differing, 0) << "points of the box that are not the picture";
 
-    // An open box costs the launcher next to nothing: under 1 % of one core over 5 s.
+    // An open box costs the launcher next to nothing: under 1 % of one core over 5 s. The mouse
+    // rests off the box: Wine polls it every 10 ms while it is over a control that tracks it.
+    MoveMouse(GetDesktopWindow(), {GetSystemMetrics(SM_CXSCREEN) - 1, 0});
     const double before = ProcessorMs(launcher.Id());
     ASSERT_GT(before, 0) << "the launcher's processor time cannot be read";
     const DWORD start = GetTickCount();
@@ -686,10 +473,7 @@ TEST_F(Commands, AboutBoxShowsItsPictureAndLeavesTheLauncherIdle) {
     std::printf("launcher processor time with the About box open: %.1f ms in %lu ms\n", used,
                 static_cast<unsigned long>(elapsed));
     EXPECT_LT(used, elapsed * 0.01);
-}
 
-TEST_F(Commands, AboutBoxClosesWithOkEnterOrTheSystemMenusCloseButNotWithEscape) {
-    ASSERT_TRUE(Start(L"-l0409"));
     struct Row {
         const char* how;
         void (*act)(HWND box);
@@ -699,30 +483,30 @@ TEST_F(Commands, AboutBoxClosesWithOkEnterOrTheSystemMenusCloseButNotWithEscape)
         {"Escape", [](HWND) { PressKey(VK_ESCAPE); }, false},
         {"Enter", [](HWND) { PressKey(VK_RETURN); }, true},
         {"a click on OK",
-         [](HWND box) {
+         [](HWND about) {
              RECT ok{};
-             GetWindowRect(GetDlgItem(box, IDOK), &ok);
+             GetWindowRect(GetDlgItem(about, IDOK), &ok);
              POINT middle{(ok.left + ok.right) / 2, (ok.top + ok.bottom) / 2};
-             ScreenToClient(box, &middle);
-             Click(box, middle);
+             ScreenToClient(about, &middle);
+             Click(about, middle);
          },
          true},
         {"the system menu's Close",
          [](HWND) {
-             OpenSystemMenu();
+             PressKey(VK_SPACE, VK_MENU);
+             Sleep(200);
              PressKey('C');
          },
          true},
     };
-    HWND box = nullptr;
     for (const Row& row : rows) {
         SCOPED_TRACE(row.how);
         if (!box) {
             ASSERT_TRUE(Press(1000));
             box = WaitForWindow(launcher.Id(), L"#32770");
             ASSERT_TRUE(box) << "no About box";
-            ASSERT_TRUE(WaitUntil([&] { return GetForegroundWindow() == box; }, 5000));
         }
+        ASSERT_TRUE(WaitUntil([&] { return GetForegroundWindow() == box; }, 5000));
         row.act(box);
         if (row.closes) {
             EXPECT_TRUE(WaitUntil([&] { return !IsWindow(box); }, kWindowWaitMs));

@@ -41,13 +41,9 @@ std::vector<BuiltProgram> BuiltPrograms() {
     return programs;
 }
 
-std::string Narrow(const std::wstring& text) {
-    return std::string(text.begin(), text.end());
-}
-
 TEST(ProgramFile, RunsFromSwapOnRemovableAndNetworkMediaWithAValidChecksum) {
     for (const BuiltProgram& program : BuiltPrograms()) {
-        SCOPED_TRACE(Narrow(program.build));
+        SCOPED_TRACE(program.build);
         char header[4096] = {};
         std::ifstream(std::filesystem::path(program.path), std::ios::binary)
             .read(header, sizeof(header));
@@ -143,7 +139,7 @@ TEST(ProgramFile, ManifestAsWindowsReadsIt) {
          {0x8e0f7a12, 0xbfb3, 0x4fe8, {0xb9, 0xa5, 0x48, 0xfd, 0x50, 0xa1, 0x5a, 0x9a}}},
     };
     for (const BuiltProgram& program : BuiltPrograms()) {
-        SCOPED_TRACE(Narrow(program.build));
+        SCOPED_TRACE(program.build);
         Manifest manifest(program.path);
         ASSERT_TRUE(manifest.Valid())
             << "no manifest, or one Windows cannot read: " << GetLastError();
@@ -155,8 +151,8 @@ TEST(ProgramFile, ManifestAsWindowsReadsIt) {
         ASSERT_GE(details.size(), sizeof(assembly));
         std::memcpy(&assembly, details.data(), sizeof(assembly));
         std::wstring identity = assembly.lpAssemblyEncodedAssemblyIdentity;
-        EXPECT_EQ(identity.find(L"Microsoft.Windows.Common-Controls,"), 0u) << Narrow(identity);
-        EXPECT_NE(identity.find(L"version=\"6."), std::wstring::npos) << Narrow(identity);
+        EXPECT_EQ(identity.find(L"Microsoft.Windows.Common-Controls,"), 0u) << identity;
+        EXPECT_NE(identity.find(L"version=\"6."), std::wstring::npos) << identity;
 
         std::vector<char> runLevel = manifest.Query(RunlevelInformationInActivationContext);
         ASSERT_GE(runLevel.size(), sizeof(ACTIVATION_CONTEXT_RUN_LEVEL_INFORMATION));
@@ -190,7 +186,7 @@ TEST(ProgramFile, VersionNamesTheMakerTheProductAndTheProjectVersion) {
         std::to_wstring(version[0]) + L"." + std::to_wstring(version[1]) + L"." +
         std::to_wstring(version[2]) + L"." + std::to_wstring(version[3]);
     for (const BuiltProgram& program : BuiltPrograms()) {
-        SCOPED_TRACE(Narrow(program.build));
+        SCOPED_TRACE(program.build);
         DWORD size = GetFileVersionInfoSizeW(program.path.c_str(), nullptr);
         ASSERT_GT(size, 0u) << "no version resource";
         std::vector<char> block(size);
@@ -214,7 +210,7 @@ TEST(ProgramFile, VersionNamesTheMakerTheProductAndTheProjectVersion) {
               Text{L"ProductName", L"The Vemo Vodizuri Virezazida AutoPlay"},
               Text{L"FileVersion", versionText}, Text{L"ProductVersion", versionText},
               Text{L"OriginalFilename", L"AutoPlay.exe"}}) {
-            SCOPED_TRACE(Narrow(text.name));
+            SCOPED_TRACE(text.name);
             wchar_t* value = nullptr;
             std::wstring path = std::wstring(L"\\StringFileInfo\\040904B0\\") + text.name;
             ASSERT_TRUE(VerQueryValueW(block.data(), path.c_str(), reinterpret_cast<void**>(&value),

@@ -2,7 +2,7 @@
 // running game, and twice.
 #include <gtest/gtest.h>
 
-#include "e2e_support_win.h"
+#include "launcher_driver_win.h"
 #include "locale/config_win.h"
 #include "test_support_win.h"
 
@@ -13,96 +13,54 @@ const wchar_t kNotOnDiscText[] =
 const wchar_t kInsertDiscText[] =
     L"To continue with this operation, please insert Disc 1 into the CD-ROM drive and click OK.";
 
-class LauncherStartup : public testing::Test {
-protected:
-    void SetUp() override {
-        DeleteMachineKey(kProductKeyPath);
-        DeleteMachineKey(kUninstallKeyPath);
-    }
-    void TearDown() override {
-        DeleteMachineKey(kProductKeyPath);
-        DeleteMachineKey(kUninstallKeyPath);
-    }
-
-    // Starts the launcher and expects the not-on-disc notice; returns it.
-    std::optional<MessageBoxSeen> StartExpectingNotOnDiscNotice(TestProcess& launcher) {
-        EXPECT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
-        std::optional<MessageBoxSeen> notice = WaitForMessageBox(launcher.Id());
-        EXPECT_TRUE(notice.has_value()) << "no message box appeared";
-        if (notice) {
-            EXPECT_EQ(notice->caption, L"");
-            EXPECT_EQ(notice->text, kNotOnDiscText);
-            EXPECT_EQ(notice->buttons, std::vector<int>{IDOK});
-        }
-        return notice;
+class LauncherStartup : public LauncherTest {
+  protected:
+    // Starts the launcher where none of its backgrounds are, which tells it that it is not on
+    // its disc, and answers the notice it shows.
+    void StartOffTheDiscAndAnswerTheNotice() {
+        disc.Remove(L"Launcher");
+        ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
+        AnswerMessageBox(launcher.Id(), L"", kNotOnDiscText, {IDOK}, IDOK);
     }
 
-    DiscFolder disc;
-    CompanionLog log;
+    // An installer the launcher started may log its start after the launcher has gone.
+    bool NothingStarted() const {
+        return !WaitUntil([&] { return !log.Lines().empty(); }, 3000);
+    }
 };
 
 TEST_F(LauncherStartup, OffTheDiscItSaysSoThenAsksForDiscOneUntilCancelled) {
-    TestProcess launcher;
-    auto notice = StartExpectingNotOnDiscNotice(launcher);
-    ASSERT_TRUE(notice);
-    EXPECT_TRUE(TopLevelWindows(launcher.Id(), L"LauncherAppClass").empty());
-    ASSERT_TRUE(PressButton(*notice, IDOK));
-
-    auto prompt = WaitForMessageBox(launcher.Id());
-    ASSERT_TRUE(prompt) << "the Install command did not ask for Disc 1";
-    EXPECT_EQ(prompt->caption, L"Insert Disc 1");
-    EXPECT_EQ(prompt->text, kInsertDiscText);
-    EXPECT_EQ(prompt->buttons, (std::vector<int>{IDOK, IDCANCEL}));
-
+    disc.Remove(L"Setup\\data2.cab");
+    ASSERT_NO_FATAL_FAILURE(StartOffTheDiscAndAnswerTheNotice());
     // OK with the disc still missing asks again; Cancel gives up and the launcher ends.
-    ASSERT_TRUE(PressButton(*prompt, IDOK));
-    auto again = WaitForMessageBox(launcher.Id());
-    ASSERT_TRUE(again);
-    EXPECT_EQ(again->caption, L"Insert Disc 1");
-    ASSERT_TRUE(PressButton(*again, IDCANCEL));
+    AnswerMessageBox(launcher.Id(), L"Insert Disc 1", kInsertDiscText, {IDOK, IDCANCEL}, IDOK);
+    AnswerMessageBox(launcher.Id(), L"Insert Disc 1", kInsertDiscText, {IDOK, IDCANCEL}, IDCANCEL);
     EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(log.Lines().empty()) << "nothing may be installed without the disc";
+    EXPECT_TRUE(NothingStarted()) << "nothing may be installed without the disc";
 }
 
 TEST_F(LauncherStartup, OffTheDiscWithTheSetupFilesItStartsTheInstallerInUsEnglish) {
-    disc.AddDiscOneFiles();
-    disc.AddBuiltProgram(L"setup.exe", L"Setup\\setup.exe");
-    TestProcess launcher;
-    auto notice = StartExpectingNotOnDiscNotice(launcher);
-    ASSERT_TRUE(notice);
-    ASSERT_TRUE(PressButton(*notice, IDOK));
-
-    auto lines = log.WaitForLines(1);
-    ASSERT_EQ(lines.size(), 1u);
-    ASSERT_EQ(lines[0].size(), 3u);
-    EXPECT_EQ(lines[0][0], L"setup.exe");
-    EXPECT_EQ(lines[0][1], L"-l0009");
-    EXPECT_TRUE(SameTextIgnoringCase(lines[0][2], disc.Root() + L"Setup"))
-        << "the installer ran in another folder";
+    ASSERT_NO_FATAL_FAILURE(StartOffTheDiscAndAnswerTheNotice());
+    log.ExpectNext(L"setup.exe", L"-l0009", disc.Path(L"Setup"));
     // The installer asks before it installs; the user declines.
     auto question = WaitForMessageBoxTitled(L"The Vemo Vodizuri Virezazida Setup");
     ASSERT_TRUE(question) << "the installer did not ask";
     EXPECT_NE(question->text.find(L"English"), std::wstring::npos);
     ASSERT_TRUE(PressButton(*question, IDCANCEL));
     EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(TopLevelWindows(launcher.Id(), L"#32770").empty());
 }
 
 TEST_F(LauncherStartup, OffTheDiscWithTheProductInstalledItOnlySaysSo) {
     ScopedMachineKey uninstall(kUninstallKeyPath);
-    disc.AddDiscOneFiles();
-    disc.AddBuiltProgram(L"setup.exe", L"Setup\\setup.exe");
-    TestProcess launcher;
-    auto notice = StartExpectingNotOnDiscNotice(launcher);
-    ASSERT_TRUE(notice);
-    ASSERT_TRUE(PressButton(*notice, IDOK));
+    ASSERT_NO_FATAL_FAILURE(StartOffTheDiscAndAnswerTheNotice());
     EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(log.Lines().empty());
+    EXPECT_TRUE(NothingStarted()) << "the installer was started";
 }
 
 TEST_F(LauncherStartup, SecondLauncherEndsAtOnceWhileTheFirstRuns) {
-    TestProcess first;
-    auto notice = StartExpectingNotOnDiscNotice(first);
+    disc.Remove(L"Launcher");
+    ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
+    std::optional<MessageBoxSeen> notice = WaitForMessageBox(launcher.Id());
     ASSERT_TRUE(notice);
 
     TestProcess second;
@@ -110,21 +68,30 @@ TEST_F(LauncherStartup, SecondLauncherEndsAtOnceWhileTheFirstRuns) {
     EXPECT_EQ(second.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
     EXPECT_TRUE(TopLevelWindows(second.Id()).empty());
     // The first one is still there, waiting for its user.
-    EXPECT_FALSE(first.WaitForExit(0).has_value());
+    EXPECT_FALSE(launcher.WaitForExit(0).has_value());
     EXPECT_TRUE(IsWindowVisible(notice->window));
-    ASSERT_TRUE(PressButton(*notice, IDOK));
     ScopedMachineKey uninstall(kUninstallKeyPath);  // nothing more to ask after the notice
-    if (auto prompt = WaitForMessageBox(first.Id(), 2000)) PressButton(*prompt, IDCANCEL);
-    EXPECT_TRUE(first.WaitForExit(kWindowWaitMs).has_value());
+    ASSERT_TRUE(PressButton(*notice, IDOK));
+    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
 }
 
-LRESULT CALLBACK GameWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    return DefWindowProcW(window, message, wParam, lParam);
+TEST_F(LauncherStartup, SecondLauncherBringsTheFirstBackRestoredAndInFront) {
+    ASSERT_TRUE(Start(L"-l040c"));
+    ShowWindow(window, SW_MINIMIZE);
+    ASSERT_TRUE(WaitUntil([&] { return IsIconic(window) != FALSE; }, 5000));
+
+    TestProcess second;
+    ASSERT_TRUE(second.Start(disc.Launcher(), L"", disc.Root()));
+    EXPECT_EQ(second.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+    EXPECT_TRUE(TopLevelWindows(second.Id()).empty());
+    EXPECT_TRUE(
+        WaitUntil([&] { return !IsIconic(window) && GetForegroundWindow() == window; }, 5000))
+        << "the first launcher stayed minimised or behind";
 }
 
 TEST_F(LauncherStartup, RunningGameMakesItEndWithoutAWord) {
     WNDCLASSW gameClass{};
-    gameClass.lpfnWndProc = GameWindowProc;
+    gameClass.lpfnWndProc = DefWindowProcW;
     gameClass.hInstance = GetModuleHandleW(nullptr);
     gameClass.lpszClassName = L"Brask";
     RegisterClassW(&gameClass);
@@ -132,10 +99,8 @@ TEST_F(LauncherStartup, RunningGameMakesItEndWithoutAWord) {
                                 nullptr, nullptr, GetModuleHandleW(nullptr), nullptr);
     ASSERT_TRUE(game);
 
-    TestProcess launcher;
     ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
-    std::optional<DWORD> exitCode = launcher.WaitForExit(kWindowWaitMs);
-    EXPECT_EQ(exitCode, std::optional<DWORD>(0));
+    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
     EXPECT_TRUE(TopLevelWindows(launcher.Id()).empty());
     DestroyWindow(game);
     UnregisterClassW(L"Brask", GetModuleHandleW(nullptr));

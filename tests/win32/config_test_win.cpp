@@ -14,7 +14,7 @@
 namespace {
 
 class Configuration : public testing::Test {
-protected:
+  protected:
     void SetUp() override {
         DeleteMachineKey(kProductKeyPath);
         DeleteMachineKey(kUninstallKeyPath);
@@ -27,8 +27,6 @@ protected:
         ResetLauncherConfiguration();
         launcher.rootPath[0] = L'\0';
     }
-
-    void WriteDiscSku(const std::string& ini) { disc.WriteFile(L"ORVAK.INI", ini); }
 
     struct Outcome {
         LanguageBase base;
@@ -97,7 +95,7 @@ TEST_F(Configuration, OtherLanguageValueWinsAndVemoLanguageIsNotRead) {
 }
 
 TEST_F(Configuration, DiscEditionTwoOffersTheListUnlessTheProductIsInAnotherLanguage) {
-    WriteDiscSku("[SKU]\r\nSKU=2\r\n");
+    disc.WriteFile(L"ORVAK.INI", "[SKU]\r\nSKU=2\r\n");
     ScopedMachineKey product(kProductKeyPath);
     struct Row {
         const char* what;
@@ -153,15 +151,6 @@ TEST_F(Configuration, ProductKeySettlesItsLanguageOrUsEnglish) {
     }
 }
 
-TEST_F(Configuration, NoProductKeyLeavesTheLanguageUnsettled) {
-    Outcome outcome = Read();
-    EXPECT_EQ(outcome.base, kNoLanguage);
-    EXPECT_FALSE(outcome.known);
-    EXPECT_FALSE(UninstallEntryExists());
-    ScopedMachineKey uninstall(kUninstallKeyPath);
-    EXPECT_TRUE(UninstallEntryExists());
-}
-
 // A 32-bit installer writes to the 32-bit view; a value only in the 64-bit view is none of the
 // product's, whichever build of the launcher reads it.
 TEST_F(Configuration, ProductKeysAreReadFromTheThirtyTwoBitView) {
@@ -208,32 +197,10 @@ TEST_F(Configuration, ProductEditionFromTheFirstByteOfVemoSku) {
         ReadProductSku();
         EXPECT_EQ(launcher.productSku, row.sku);
     }
-}
-
-TEST_F(Configuration, ProductEditionUnchangedWithoutTheProductKey) {
+    DeleteMachineKey(kProductKeyPath);
     launcher.productSku = 4;
     ReadProductSku();
-    EXPECT_EQ(launcher.productSku, 4u);
-}
-
-TEST_F(Configuration, DiscEditionFromOrvakIni) {
-    struct Row {
-        const char* ini;  // null: no ORVAK.INI
-        std::uint32_t sku;
-    };
-    for (Row row : {Row{"[SKU]\r\nSKU=5\r\n", 5}, Row{"[SKU]\r\nSKU=3\r\nOTHER=1\r\n", 3},
-                    Row{"[Other]\r\nSKU=4\r\n", 0}, Row{"[SKU]\r\nEdition=4\r\n", 0}, Row{"", 0},
-                    Row{nullptr, 0}}) {
-        SCOPED_TRACE(row.ini ? row.ini : "no file");
-        if (row.ini) {
-            WriteDiscSku(row.ini);
-        } else {
-            DeleteFileW((disc.Path() + L"ORVAK.INI").c_str());
-        }
-        launcher.discSku = 99;
-        ReadDiscSku();
-        EXPECT_EQ(launcher.discSku, row.sku);
-    }
+    EXPECT_EQ(launcher.productSku, 4u) << "changed without the product key";
 }
 
 TEST_F(Configuration, LocaleValueNamesTheMenuLanguageWithoutItsTerminator) {

@@ -33,7 +33,7 @@ std::size_t Count(const std::wstring& text, const std::wstring& part) {
 }
 
 class StringSets : public testing::Test {
-protected:
+  protected:
     void SetUp() override { ResetLauncherConfiguration(); }
 };
 
@@ -43,7 +43,7 @@ bool UsesFullWidthStops(LanguageBase base) {
     return base == kJapanese || base == kTraditionalChinese || base == kSimplifiedChinese;
 }
 
-TEST_F(StringSets, EveryLanguageHasEveryOffsetAndFitsItsBuffer) {
+TEST_F(StringSets, EveryLanguageHasEveryOffsetFitsItsBufferAndKeepsItsPlaceholder) {
     for (const LanguageInfo& language : Languages()) {
         for (std::uint32_t offset : kOffsets) {
             SCOPED_TRACE(testing::Message() << "string " << language.base + offset);
@@ -58,50 +58,15 @@ TEST_F(StringSets, EveryLanguageHasEveryOffsetAndFitsItsBuffer) {
             if (fullWidth) {
                 EXPECT_EQ(text.find(L"\u3002 "), std::wstring::npos);
             }
+            // The two formats take the demo's file name; a stray % would be read as another.
+            const bool isFormat = offset == 24 || offset == 25;
+            EXPECT_EQ(Count(text, L"%s"), isFormat ? 1u : 0u);
+            EXPECT_EQ(Count(text, L"%"), isFormat ? 1u : 0u);
         }
         for (std::uint32_t offset : kCaptionOffsets) {
             SCOPED_TRACE(testing::Message() << "caption " << language.base + offset);
             EXPECT_LT(Load(language.base, offset).size(), kCaptionCapacity);
         }
-    }
-}
-
-TEST_F(StringSets, FormatsKeepExactlyOnePlaceholder) {
-    for (const LanguageInfo& language : Languages()) {
-        for (std::uint32_t offset : kOffsets) {
-            SCOPED_TRACE(testing::Message() << "string " << language.base + offset);
-            std::wstring text = Load(language.base, offset);
-            bool isFormat = offset == 24 || offset == 25;
-            EXPECT_EQ(Count(text, L"%s"), isFormat ? 1u : 0u);
-            EXPECT_EQ(Count(text, L"%"), isFormat ? 1u : 0u);
-        }
-    }
-}
-
-TEST_F(StringSets, OwnNamesAreWrittenInTheirOwnLanguage) {
-    const std::pair<LanguageBase, const wchar_t*> names[] = {
-        {kUsEnglish, L"English"},
-        {kFrench, L"Fran\u00e7ais"},
-        {kGerman, L"Deutsch"},
-        {kSwedish, L"Svenska"},
-        {kDutch, L"Nederlands"},
-        {kPortuguese, L"Portugu\u00eas(BR)"},
-        {kSpanish, L"Espa\u00f1ol"},
-        {kItalian, L"Italiano"},
-        {kPolish, L"Polski"},
-        {kJapanese, L"\u65e5\u672c\u8a9e"},
-        {kTraditionalChinese, L"\u7e41\u9ad4\u4e2d\u6587"},
-        {kSimplifiedChinese, L"\u7b80\u4f53\u4e2d\u6587\u7248"},
-        {kThai, L"\u0e44\u0e17\u0e22"},
-        {kKorean, L"\ud55c\uad6d\uc5b4"},
-        {kUkEnglish, L"English"},
-        {kNorwegian, L"Norsk"},
-        {kFinnish, L"Suomeksi"},
-        {kDanish, L"Dansk"},
-    };
-    for (const auto& [base, name] : names) {
-        SCOPED_TRACE(base);
-        EXPECT_EQ(Load(base, kStrLanguageName), name);
     }
 }
 

@@ -4,6 +4,7 @@
 
 #include <cstring>
 
+#include "graphics/dib.h"
 #include "platform/text_win.h"
 #include "shell/launcher_state.h"
 
@@ -44,9 +45,9 @@ ScopedMachineKey::~ScopedMachineKey() {
 
 void ScopedMachineKey::SetText(const wchar_t* name, const std::wstring& text) {
     DWORD bytes = static_cast<DWORD>((text.size() + 1) * sizeof(wchar_t));
-    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.c_str()),
-                             bytes),
-              ERROR_SUCCESS);
+    ASSERT_EQ(
+        RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.c_str()), bytes),
+        ERROR_SUCCESS);
 }
 
 void ScopedMachineKey::SetUnterminatedText(const wchar_t* name, const std::wstring& text) {
@@ -54,9 +55,9 @@ void ScopedMachineKey::SetUnterminatedText(const wchar_t* name, const std::wstri
     // data is followed by something else here.
     std::wstring guarded = text + L"#";
     DWORD bytes = static_cast<DWORD>(text.size() * sizeof(wchar_t));
-    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(guarded.data()),
-                             bytes),
-              ERROR_SUCCESS);
+    ASSERT_EQ(
+        RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(guarded.data()), bytes),
+        ERROR_SUCCESS);
 }
 
 void ScopedMachineKey::SetDword(const wchar_t* name, DWORD value) {
@@ -102,7 +103,8 @@ std::wstring TempFolder::MakeFoldersFor(const std::wstring& relativePath) const 
     return path;
 }
 
-std::wstring TempFolder::WriteFile(const std::wstring& relativePath, const std::string& bytes) const {
+std::wstring TempFolder::WriteFile(const std::wstring& relativePath,
+                                   const std::string& bytes) const {
     std::wstring path = MakeFoldersFor(relativePath);
     HANDLE file = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
                               FILE_ATTRIBUTE_NORMAL, nullptr);
@@ -219,6 +221,33 @@ BITMAPINFO TopDownInfo(int width, int height) {
     info.bmiHeader.biPlanes = 1;
     info.bmiHeader.biBitCount = 32;
     return info;
+}
+
+Surface::Surface(int width, int height) : width_(width) {
+    BITMAPINFO info = TopDownInfo(width, height);
+    WindowDc screen(nullptr);
+    dc_.Reset(CreateCompatibleDC(screen.Get()));
+    bitmap_.Reset(CreateDIBSection(dc_.Get(), &info, DIB_RGB_COLORS, &bits_, nullptr, 0));
+    selected_ = SelectObject(dc_.Get(), bitmap_.Get());
+}
+
+Rgb Surface::At(int x, int y) const {
+    GdiFlush();
+    const auto* pixel = static_cast<const std::uint8_t*>(bits_) + (y * width_ + x) * 4;
+    return {pixel[2], pixel[1], pixel[0]};
+}
+
+Rgb PixelOf(const DibBitmap* picture, int x, int y) {
+    const std::uint8_t* rows = nullptr;
+    std::uint32_t stride = 0;
+    std::uint16_t depth = 0;
+    std::int32_t width = 0, height = 0;
+    if (!DibRowInfo(picture, rows, stride, depth) || !DibDimensions(picture, width, height)) {
+        return {0, 0, 0};
+    }
+    const std::uint8_t* p =
+        rows + static_cast<std::size_t>(height - 1 - y) * stride + x * (depth / 8);
+    return depth == 8 ? Rgb{0, 0, p[0]} : Rgb{p[2], p[1], p[0]};
 }
 
 testing::AssertionResult SameBlock(const DibBitmap* a, const DibBitmap* b) {

@@ -12,6 +12,7 @@
 #include <string>
 
 #include "locale/language_table.h"
+#include "platform/handles_win.h"
 #include "platform/registry_win.h"
 
 // Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine. Keys are
@@ -26,7 +27,7 @@ std::optional<std::wstring> MachineText(const wchar_t* path, const wchar_t* name
 // An HKEY_LOCAL_MACHINE key created for one test and deleted with everything below it when
 // the test ends.
 class ScopedMachineKey {
-public:
+  public:
     explicit ScopedMachineKey(const wchar_t* path, REGSAM view = kProductRegistryView);
     ~ScopedMachineKey();
     ScopedMachineKey(const ScopedMachineKey&) = delete;
@@ -39,7 +40,7 @@ public:
     void SetBinary(const wchar_t* name, const void* data, DWORD size);
     HKEY Get() const { return key_; }
 
-private:
+  private:
     std::wstring path_;
     REGSAM view_;
     HKEY key_ = nullptr;
@@ -48,7 +49,7 @@ private:
 // A new empty folder under %TEMP%, removed with its contents when the test ends (programs
 // started from it get a few seconds to close first).
 class TempFolder {
-public:
+  public:
     TempFolder();
     ~TempFolder();
     TempFolder(const TempFolder&) = delete;
@@ -61,7 +62,7 @@ public:
     // Makes the sub-folders a file below the folder needs and returns the file's path.
     std::wstring MakeFoldersFor(const std::wstring& relativePath) const;
 
-private:
+  private:
     std::wstring path_;
 };
 
@@ -89,7 +90,28 @@ Rgb ScreenPixel(int x, int y);
 // The header of a 32-bit top-down picture, the layout tests read pixels in.
 BITMAPINFO TopDownInfo(int width, int height);
 
+// A 32-bit top-down memory surface that a window or a button is painted into, read back as
+// pixels.
+class Surface {
+  public:
+    Surface(int width, int height);
+    ~Surface() { SelectObject(dc_.Get(), selected_); }
+    Surface(const Surface&) = delete;
+    Surface& operator=(const Surface&) = delete;
+    HDC Dc() const { return dc_.Get(); }
+    Rgb At(int x, int y) const;
+
+  private:
+    int width_;
+    MemoryDc dc_;
+    UniqueGdi<HBITMAP> bitmap_;
+    HGDIOBJ selected_ = nullptr;
+    void* bits_ = nullptr;
+};
+
 struct DibBitmap;
+// A pixel of a picture block, counted from the top (24-bit: its colour; 8-bit: its value in b).
+Rgb PixelOf(const DibBitmap* picture, int x, int y);
 // Success when both blocks have the same length and bytes; otherwise says where they part.
 testing::AssertionResult SameBlock(const DibBitmap* a, const DibBitmap* b);
 
