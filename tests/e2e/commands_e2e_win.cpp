@@ -75,10 +75,15 @@ class Commands : public LauncherTest {
         GetWindowThreadProcessId(notepad, &processId);
         const std::wstring image = ProcessImage(processId);
         EXPECT_TRUE(SameTextIgnoringCase(image, SystemNotepad())) << image;
-        // The window shows before the file is read into it, on a loaded machine seconds before.
-        HWND edit = FindWindowExW(notepad, nullptr, L"Edit", nullptr);
+        // The window shows before its edit control exists and before the file is read into
+        // it, on a loaded machine seconds before.
         const std::wstring text = Utf16File(file);
-        EXPECT_TRUE(WaitUntil([&] { return EditText(edit) == text; }, kWindowWaitMs))
+        EXPECT_TRUE(WaitUntil(
+            [&] {
+                HWND edit = FindWindowExW(notepad, nullptr, L"Edit", nullptr);
+                return edit && EditText(edit) == text;
+            },
+            kWindowWaitMs))
             << "Notepad shows " << TextOfWindow(notepad);
         EXPECT_TRUE(CloseWindowOf(L"Notepad"));
     }
