@@ -39,7 +39,7 @@ bool MenuController::HandleKey(std::uint32_t virtualKey, bool shift, HWND focus)
             if (panelOpen) {
                 const std::int32_t page = lastPanel;
                 CloseOpenPanel();
-                std::int32_t opener = page == GamesPanel ? gamesIndex
+                std::int32_t opener = page == GamesPanel  ? gamesIndex
                                       : page == InfoPanel ? infoIndex
                                                           : playIndex;
                 if (LauncherButton* button = MainPageButton(opener); button && button->visible) {

@@ -53,10 +53,9 @@ LauncherButton::LauncherButton(HWND parent, std::int32_t imageIndex_, std::uint3
     }
     DWORD style = WS_CHILD | BS_OWNERDRAW | (initiallyVisible ? WS_VISIBLE : 0);
     // The label is the window's text too, so screen readers announce the button.
-    window = CreateWindowExW(0, L"BUTTON", label.empty() ? nullptr : label.c_str(), style, x, y,
-                             width, height, parent,
-                             reinterpret_cast<HMENU>(static_cast<UINT_PTR>(id)), launcher.instance,
-                             nullptr);
+    window = CreateWindowExW(
+        0, L"BUTTON", label.empty() ? nullptr : label.c_str(), style, x, y, width, height, parent,
+        reinterpret_cast<HMENU>(static_cast<UINT_PTR>(id)), launcher.instance, nullptr);
 }
 
 LauncherButton::~LauncherButton() {
@@ -110,9 +109,13 @@ void LauncherButton::Draw(ButtonState state, HDC dc) {
     DrawTextW(dc, label.c_str(), -1, &area, kLabelFormat);
 }
 
-bool LauncherButton::HitTest(std::int32_t, std::int32_t) const { return true; }
+bool LauncherButton::HitTest(std::int32_t, std::int32_t) const {
+    return true;
+}
 
-bool LauncherButton::IsShaped() const { return false; }
+bool LauncherButton::IsShaped() const {
+    return false;
+}
 
 void VemoLauncherButton::SetCircle(std::int32_t centerX_, std::int32_t centerY_,
                                    std::int32_t radius_) {
@@ -146,4 +149,6 @@ bool VemoLauncherButton::HitTest(std::int32_t screenX, std::int32_t screenY) con
     return InsideHitCircle({centerX, centerY, radius}, point.x, point.y);
 }
 
-bool VemoLauncherButton::IsShaped() const { return true; }
+bool VemoLauncherButton::IsShaped() const {
+    return true;
+}

@@ -14,7 +14,7 @@
 #include "menu/button_rules.h"
 
 class LauncherButton {
-public:
+  public:
     // `labelLanguage` kActiveLanguage stands for the active language at this moment, so a later
     // change of language leaves the button as it is. Label offset 0: no label.
     LauncherButton(HWND parent, std::int32_t imageIndex, std::uint32_t id,
@@ -54,7 +54,7 @@ public:
 };
 
 class VemoLauncherButton : public LauncherButton {
-public:
+  public:
     using LauncherButton::LauncherButton;
 
     // Centre and radius in the button's client coordinates.

@@ -16,7 +16,7 @@
 #include "menu/screen_layout.h"
 
 class MenuController {
-public:
+  public:
     MenuController() = default;
     ~MenuController();
     MenuController(const MenuController&) = delete;
@@ -70,7 +70,7 @@ public:
     std::int32_t infoIndex = -1;
     std::int32_t lastPanel = 0;
 
-private:
+  private:
     // Adds a new button to its page, to allButtons and to buttonsByWindow; the position it got
     // in its page.
     std::int32_t Register(std::int32_t page, std::unique_ptr<LauncherButton> button);

@@ -1,10 +1,11 @@
-#include "menu/menu_controller.h"
-
 #include <new>
 
+#include "menu/menu_controller.h"
 #include "shell/launcher_state.h"
 
-MenuController::~MenuController() { DestroyAllButtons(); }
+MenuController::~MenuController() {
+    DestroyAllButtons();
+}
 
 void MenuController::BuildSafely(void (MenuController::*build)(HWND), HWND parent) {
     try {
@@ -82,7 +83,8 @@ void MenuController::Refresh() {
     // paint still needs the game's folder.
     if (!mainMenuBuilt) return;
     bool changed = false;
-    if (LauncherButton* install = MainPageButton(installIndex)) changed |= install->SetWanted(!installed);
+    if (LauncherButton* install = MainPageButton(installIndex))
+        changed |= install->SetWanted(!installed);
     if (LauncherButton* play = MainPageButton(playIndex)) changed |= play->SetWanted(installed);
     if (changed) ShowPage(MainPage);
 }
@@ -91,7 +93,8 @@ void MenuController::ShowPage(std::int32_t page) {
     if (page < 0 || page >= kPageCount) return;
     const bool panel = page == InfoPanel || page == GamesPanel || page == PlayPanel;
     if (panel && !panelOpen) return;
-    for (LauncherButton* button : pages[static_cast<std::size_t>(page)]) button->Show(button->wanted);
+    for (LauncherButton* button : pages[static_cast<std::size_t>(page)])
+        button->Show(button->wanted);
 }
 
 void MenuController::SetPageShown(std::int32_t page, bool show) {

@@ -63,8 +63,8 @@ constexpr std::int32_t kListPlateHeight = 50;
 constexpr std::uint32_t kLanguageNameOffset = 73;
 
 struct LanguageListSpec {
-    std::vector<LanguageButtonSpec> buttons;  // in creation order
-    std::optional<std::uint32_t> productSku;  // the product edition the list stands for
+    std::vector<LanguageButtonSpec> buttons;     // in creation order
+    std::optional<std::uint32_t> productSku;     // the product edition the list stands for
     LanguageBase settledLanguage = kNoLanguage;  // editions without a list settle it at once
 };
 LanguageListSpec LanguageListFor(std::uint32_t discSku);

@@ -79,6 +79,10 @@ LRESULT CALLBACK MouseHookProc(int code, WPARAM wParam, LPARAM lParam) {
     return CallNextHookEx(hook.hookHandle, code, LOWORD(wParam), lParam);
 }
 
-HWND HoverFocusWindow() { return hook.focusWindow; }
+HWND HoverFocusWindow() {
+    return hook.focusWindow;
+}
 
-void NoteKeyboardFocus(HWND window) { hook.focusWindow = window; }
+void NoteKeyboardFocus(HWND window) {
+    hook.focusWindow = window;
+}
