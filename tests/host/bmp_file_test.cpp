@@ -3,13 +3,12 @@
 #include <gtest/gtest.h>
 
 #include <cstring>
-#include <vector>
 
 #include "test_files.h"
 
 namespace {
 
-TEST(BmpFile, WholeFilesOfEveryKindAreAccepted) {
+TEST(BmpFile, WholeFilesOfEveryKindAreAcceptedAndCutOnesAtNoLength) {
     for (std::uint16_t depth : {1, 4, 8, 16, 24, 32}) {
         SCOPED_TRACE(depth);
         auto file = BmpFile(209, 49, depth);
@@ -19,13 +18,9 @@ TEST(BmpFile, WholeFilesOfEveryKindAreAccepted) {
     }
     auto topDown = BmpFile(10, -10, 24);
     EXPECT_TRUE(BmpFileIsWhole(topDown.data(), topDown.size()));
-}
-
-TEST(BmpFile, TruncatedFilesAreRejectedAtEveryLength) {
     auto file = BmpFile(21, 5, 8);
     for (std::size_t length = 0; length < file.size(); ++length) {
-        SCOPED_TRACE(length);
-        ASSERT_FALSE(BmpFileIsWhole(file.data(), length));
+        ASSERT_FALSE(BmpFileIsWhole(file.data(), length)) << length << " bytes";
     }
     EXPECT_FALSE(BmpFileIsWhole(nullptr, 100));
 }

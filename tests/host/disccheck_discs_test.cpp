@@ -1,12 +1,10 @@
-// The disc check as CI runs it: the host-built tool on the shipped (32-bit) sample disc in
-// every edition, and on damaged copies of it, each damage reported by its own line and exit
-// code 1. It needs the built discs, so the MinGW build's tests run it (SampleDisc.*):
-// DISCCHECK names the tool, DISCCHECK_DISC the 32-bit disc and DISCCHECK_64BIT_LAUNCHER the
-// 64-bit build's AutoPlay.exe.
+// The host-built disc check on the shipped sample disc and damaged copies of it. It needs the
+// built discs, so the MinGW build's tests run it, naming them in DISCCHECK_* variables.
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 
 #include <cstdio>
+#include <cstring>
 #include <functional>
 
 #include "pe_image.h"
@@ -31,14 +29,8 @@ ToolRun RunTool(const std::string& arguments) {
     const std::string command = "'" + Environment("DISCCHECK") + "' " + arguments + " 2>&1";
     FILE* output = popen(command.c_str(), "r");
     if (!output) return run;
-    std::string line;
-    for (int c; (c = std::fgetc(output)) != EOF;) {
-        if (c != '\n') {
-            line += static_cast<char>(c);
-        } else {
-            run.lines.push_back(line);
-            line.clear();
-        }
+    for (char line[4096]; std::fgets(line, sizeof line, output);) {
+        run.lines.emplace_back(line, std::strcspn(line, "\n"));
     }
     const int status = pclose(output);
     run.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
@@ -57,37 +49,36 @@ fs::path CopyOfDisc(const TempFolder& folder, int edition) {
     return disc;
 }
 
-std::vector<std::uint8_t> ReadBytes(const fs::path& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-}
-
 void Patch(std::vector<std::uint8_t>& bytes, std::size_t at,
            const std::vector<std::uint8_t>& with) {
     std::copy(with.begin(), with.end(), bytes.begin() + static_cast<std::ptrdiff_t>(at));
 }
 
-// Renumbers bitmap `id` in the program's resource directory, so that the program lacks it.
-void RemoveBitmap(const fs::path& program, std::uint16_t id) {
-    auto bytes = ReadBytes(program);
+// Rewrites the program in place: `change` gets its bytes and where its resources are.
+void Rewrite(const fs::path& program,
+             const std::function<void(std::vector<std::uint8_t>&, const PeImage&)>& change) {
+    std::ifstream file(program, std::ios::binary);
+    std::vector<std::uint8_t> bytes{std::istreambuf_iterator<char>(file), {}};
+    file.close();
     const auto image = ReadPeImage(bytes);
     ASSERT_TRUE(image);
-    const std::uint32_t unused = 0x7FF0;
-    Patch(bytes, image->resources.at({NumberedType(kResourceBitmap), id}).idEntry,
-          {unused & 0xFF, unused >> 8, 0, 0});
+    change(bytes, *image);
     WriteFile(program, bytes);
 }
 
+// Renumbers bitmap `id` in the program's resource directory, so that the program lacks it.
+void RemoveBitmap(std::vector<std::uint8_t>& bytes, const PeImage& image, std::uint16_t id) {
+    Patch(bytes, image.resources.at({NumberedType(kResourceBitmap), id}).idEntry,
+          {0xF0, 0x7F, 0, 0});
+}
+
 // Rewrites the string block that holds `id` with that string empty.
-void EmptyString(const fs::path& program, std::uint32_t id) {
-    auto bytes = ReadBytes(program);
-    const auto image = ReadPeImage(bytes);
-    ASSERT_TRUE(image);
-    const ResourceBytes block = image->resources.at(
+void EmptyString(std::vector<std::uint8_t>& bytes, const PeImage& image, std::uint32_t id) {
+    const ResourceBytes block = image.resources.at(
         {NumberedType(kResourceString), static_cast<std::uint16_t>(id / 16 + 1)});
     std::vector<std::uint8_t> rewritten;
     for (std::uint32_t entry = id / 16 * 16; entry < id / 16 * 16 + 16; ++entry) {
-        const std::u16string text = entry == id ? u"" : *FindResourceString(bytes, *image, entry);
+        const std::u16string text = entry == id ? u"" : *FindResourceString(bytes, image, entry);
         rewritten.push_back(static_cast<std::uint8_t>(text.size() & 0xFF));
         rewritten.push_back(static_cast<std::uint8_t>(text.size() >> 8));
         for (char16_t unit : text) {
@@ -97,16 +88,6 @@ void EmptyString(const fs::path& program, std::uint32_t id) {
     }
     rewritten.resize(block.size, 0);
     Patch(bytes, block.offset, rewritten);
-    WriteFile(program, bytes);
-}
-
-// Makes the palette resource an older palette version.
-void DamagePalette(const fs::path& program) {
-    auto bytes = ReadBytes(program);
-    const auto image = ReadPeImage(bytes);
-    ASSERT_TRUE(image);
-    Patch(bytes, image->resources.at({"IDR_PALETTE", 247}).offset + 20, {0x00, 0x02});
-    WriteFile(program, bytes);
 }
 
 class SampleDisc : public ::testing::Test {
@@ -191,15 +172,25 @@ TEST_F(SampleDisc, EachDamageIsReportedByItsLine) {
          "error    AutoPlay.exe: a 64-bit (x86-64) program, not 32-bit -> it will not start on a "
          "32-bit Windows"},
         {"launcher without a bitmap", 1,
-         [](const fs::path& disc) { RemoveBitmap(disc / "AutoPlay.exe", 380); },
+         [](const fs::path& disc) {
+             Rewrite(disc / "AutoPlay.exe",
+                     [](auto& bytes, auto& image) { RemoveBitmap(bytes, image, 380); });
+         },
          "error    AutoPlay.exe: bitmap 380: missing -> a main-menu button (picture 11) is blank "
          "or misdrawn when normal"},
         {"launcher without a string", 1,
-         [](const fs::path& disc) { EmptyString(disc / "AutoPlay.exe", 7073); },
+         [](const fs::path& disc) {
+             Rewrite(disc / "AutoPlay.exe",
+                     [](auto& bytes, auto& image) { EmptyString(bytes, image, 7073); });
+         },
          "error    AutoPlay.exe: string 7073 (Spanish) missing -> an empty text in its place on "
          "the Spanish screens"},
         {"launcher with an old palette", 1,
-         [](const fs::path& disc) { DamagePalette(disc / "AutoPlay.exe"); },
+         [](const fs::path& disc) {
+             Rewrite(disc / "AutoPlay.exe", [](auto& bytes, const PeImage& image) {
+                 Patch(bytes, image.resources.at({"IDR_PALETTE", 247}).offset + 20, {0x00, 0x02});
+             });
+         },
          "warning  AutoPlay.exe: palette 247 (IDR_PALETTE): version 0x0200, not 0x0300 -> wrong "
          "colours on 256-colour displays"},
     };

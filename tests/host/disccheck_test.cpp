@@ -1,5 +1,4 @@
-// The disc check's parts: reading a program's resources, bitmap resources, paths found as
-// Windows finds them, the edition file, the languages an edition shows and the findings.
+// The disc check's parts: resources, paths, the edition file, languages and the findings.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -23,20 +22,18 @@ struct TestResource {
     std::vector<std::uint8_t> data;
 };
 
-void Put16(std::vector<std::uint8_t>& bytes, std::size_t at, std::uint32_t value) {
+void Put16(std::vector<std::uint8_t>& bytes, std::size_t at, std::size_t value) {
     std::memcpy(&bytes[at], &value, 2);
 }
-void Put32(std::vector<std::uint8_t>& bytes, std::size_t at, std::uint32_t value) {
+void Put32(std::vector<std::uint8_t>& bytes, std::size_t at, std::size_t value) {
     std::memcpy(&bytes[at], &value, 4);
 }
 
-// A program image with one resource section at RVA 0x1000, file offset 0x200, holding a
-// resource tree (type, id, language) of the given resources.
+// A program image whose one section (RVA 0x1000, file offset 0x200) holds these resources.
 std::vector<std::uint8_t> ProgramImage(const std::vector<TestResource>& resources,
                                        std::uint16_t machine = kMachineI386,
                                        bool pe32Plus = false) {
     constexpr std::uint32_t kSectionRva = 0x1000;
-    constexpr std::size_t kSectionOffset = 0x200;
     std::map<std::string, std::map<std::uint16_t, std::vector<const TestResource*>>> tree;
     for (const TestResource& resource : resources) {
         tree[resource.type][resource.id].push_back(&resource);
@@ -47,72 +44,67 @@ std::vector<std::uint8_t> ProgramImage(const std::vector<TestResource>& resource
         section.resize(at + (size + 3) / 4 * 4);
         return at;
     };
+    // A directory's header; returns where its entries start. Named entries come first.
     auto directory = [&](std::size_t entries, std::size_t named) {
         const std::size_t at = reserve(16 + 8 * entries);
-        Put16(section, at + 12, static_cast<std::uint32_t>(named));
-        Put16(section, at + 14, static_cast<std::uint32_t>(entries - named));
-        return at;
+        Put16(section, at + 12, named);
+        Put16(section, at + 14, entries - named);
+        return at + 16;
     };
-    const std::size_t root = directory(
-        tree.size(),
-        static_cast<std::size_t>(std::count_if(
-            tree.begin(), tree.end(), [](const auto& type) { return type.first[0] != '#'; })));
-    std::size_t typeIndex = 0;
+    auto entry = [&](std::size_t& at, std::size_t name, std::size_t target) {
+        Put32(section, at, name);
+        Put32(section, at + 4, target);
+        at += 8;
+    };
+    std::size_t typeEntry =
+        directory(tree.size(),
+                  static_cast<std::size_t>(std::count_if(
+                      tree.begin(), tree.end(), [](auto& type) { return type.first[0] != '#'; })));
     for (const auto& [type, ids] : tree) {
-        const std::size_t typeEntry = root + 16 + 8 * typeIndex++;
+        std::size_t name = 0;
         if (type[0] == '#') {
-            Put32(section, typeEntry, static_cast<std::uint32_t>(std::stoul(type.substr(1))));
+            name = std::stoul(type.substr(1));
         } else {
-            const std::size_t name = reserve(2 + 2 * type.size());
-            Put16(section, name, static_cast<std::uint32_t>(type.size()));
-            for (std::size_t i = 0; i < type.size(); ++i) Put16(section, name + 2 + 2 * i, type[i]);
-            Put32(section, typeEntry, 0x80000000u | static_cast<std::uint32_t>(name));
+            const std::size_t at = reserve(2 + 2 * type.size());
+            Put16(section, at, type.size());
+            for (std::size_t i = 0; i < type.size(); ++i) Put16(section, at + 2 + 2 * i, type[i]);
+            name = 0x80000000u | at;
         }
-        const std::size_t idDirectory = directory(ids.size(), 0);
-        Put32(section, typeEntry + 4, 0x80000000u | static_cast<std::uint32_t>(idDirectory));
-        std::size_t idIndex = 0;
+        std::size_t idEntry = directory(ids.size(), 0);
+        entry(typeEntry, name, 0x80000000u | (idEntry - 16));
         for (const auto& [id, languages] : ids) {
-            const std::size_t idEntry = idDirectory + 16 + 8 * idIndex++;
-            const std::size_t languageDirectory = directory(languages.size(), 0);
-            Put32(section, idEntry, id);
-            Put32(section, idEntry + 4,
-                  0x80000000u | static_cast<std::uint32_t>(languageDirectory));
-            for (std::size_t i = 0; i < languages.size(); ++i) {
+            std::size_t languageEntry = directory(languages.size(), 0);
+            entry(idEntry, id, 0x80000000u | (languageEntry - 16));
+            for (const TestResource* language : languages) {
                 const std::size_t dataEntry = reserve(16);
-                const std::size_t data = reserve(languages[i]->data.size());
-                std::copy(languages[i]->data.begin(), languages[i]->data.end(),
+                const std::size_t data = reserve(language->data.size());
+                std::copy(language->data.begin(), language->data.end(),
                           section.begin() + static_cast<std::ptrdiff_t>(data));
-                Put32(section, languageDirectory + 16 + 8 * i, languages[i]->language);
-                Put32(section, languageDirectory + 20 + 8 * i,
-                      static_cast<std::uint32_t>(dataEntry));
-                Put32(section, dataEntry, kSectionRva + static_cast<std::uint32_t>(data));
-                Put32(section, dataEntry + 4,
-                      static_cast<std::uint32_t>(languages[i]->data.size()));
+                entry(languageEntry, language->language, dataEntry);
+                Put32(section, dataEntry, kSectionRva + data);
+                Put32(section, dataEntry + 4, language->data.size());
             }
         }
     }
 
     const std::size_t optionalSize = pe32Plus ? 240 : 224;
-    std::vector<std::uint8_t> image(kSectionOffset);
-    image[0] = 'M';
-    image[1] = 'Z';
+    std::vector<std::uint8_t> image(0x200);
+    std::memcpy(&image[0], "MZ", 2);
     Put32(image, 0x3C, 0x40);
     std::memcpy(&image[0x40], "PE\0\0", 4);
     Put16(image, 0x44, machine);
     Put16(image, 0x46, 1);
-    Put16(image, 0x54, static_cast<std::uint32_t>(optionalSize));
-    const std::size_t optional = 0x58;
-    Put16(image, optional, pe32Plus ? 0x20B : 0x10B);
-    const std::size_t count = optional + (pe32Plus ? 108 : 92);
+    Put16(image, 0x54, optionalSize);
+    Put16(image, 0x58, pe32Plus ? 0x20B : 0x10B);
+    const std::size_t count = 0x58 + (pe32Plus ? 108 : 92);  // then the data directories
     Put32(image, count, 16);
     Put32(image, count + 4 + 2 * 8, kSectionRva);
-    Put32(image, count + 4 + 2 * 8 + 4, static_cast<std::uint32_t>(section.size()));
-    const std::size_t sectionHeader = optional + optionalSize;
-    std::memcpy(&image[sectionHeader], ".rsrc", 5);
-    Put32(image, sectionHeader + 8, static_cast<std::uint32_t>(section.size()));
-    Put32(image, sectionHeader + 12, kSectionRva);
-    Put32(image, sectionHeader + 16, static_cast<std::uint32_t>(section.size()));
-    Put32(image, sectionHeader + 20, kSectionOffset);
+    Put32(image, count + 4 + 2 * 8 + 4, section.size());
+    const std::size_t header = 0x58 + optionalSize;
+    std::memcpy(&image[header], ".rsrc", 5);
+    for (std::size_t at : {header + 8, header + 16}) Put32(image, at, section.size());
+    Put32(image, header + 12, kSectionRva);
+    Put32(image, header + 20, 0x200);
     image.insert(image.end(), section.begin(), section.end());
     return image;
 }
@@ -144,7 +136,9 @@ std::vector<TestResource> SampleResources() {
     };
 }
 
-TEST(PeImage, FindsResourcesByTypeIdAndLanguage) {
+TEST(PeImage, FindsResourcesByTypeIdAndLanguageAndStringsAsLoadStringDoes) {
+    const std::pair<std::uint32_t, std::optional<std::u16string>> strings[] = {
+        {7073, u"Dansk"}, {7072, u""}, {7087, u""}, {7088, std::nullopt}, {7071, std::nullopt}};
     for (const auto& [machine, pe32Plus] :
          {std::pair{kMachineI386, false}, std::pair{kMachineAmd64, true}}) {
         SCOPED_TRACE(pe32Plus ? "64-bit" : "32-bit");
@@ -158,27 +152,14 @@ TEST(PeImage, FindsResourcesByTypeIdAndLanguage) {
         EXPECT_EQ(image->resources.at({"#2", 381}).size, 3u);
         EXPECT_EQ(image->resources.at({"#2", 382}).size, 1u);
         EXPECT_EQ(image->resources.count({"#2", 383}), 0u);
+        for (const auto& [id, text] : strings) {
+            EXPECT_EQ(FindResourceString(file, *image, id), text) << "string " << id;
+        }
     }
     const auto named = ProgramImage({{"idr_Palette", 247, 1033, {9, 9, 9, 9}}});
     const auto image = ReadPeImage(named);
     ASSERT_TRUE(image);
     EXPECT_EQ(image->resources.at({"IDR_PALETTE", 247}).size, 4u);
-}
-
-TEST(PeImage, StringsAsLoadStringFindsThem) {
-    const auto file = ProgramImage(SampleResources());
-    const auto image = ReadPeImage(file);
-    ASSERT_TRUE(image);
-    const struct {
-        std::uint32_t id;
-        std::optional<std::u16string> text;
-    } rows[] = {
-        {7073, u"Dansk"}, {7072, u""}, {7087, u""}, {7088, std::nullopt}, {7071, std::nullopt},
-    };
-    for (const auto& row : rows) {
-        SCOPED_TRACE(row.id);
-        EXPECT_EQ(FindResourceString(file, *image, row.id), row.text);
-    }
     // A block that ends inside its strings holds only those before the cut.
     auto cut = SampleResources();
     cut[5].data.resize(2 + 2 + 5 * 2 - 1);
@@ -328,85 +309,55 @@ TEST(EditionFile, ReadAsTheProfileReaderReadsIt) {
     }
 }
 
+// Editions 1, 2 and 6 show in the files they need: below, and on the sample disc.
 TEST(DiscChecks, LanguagesAnEditionShows) {
-    // Editions 1 and 6 (where UK English brings the US English menu) are read from the files
-    // an empty disc needs, below.
-    const struct {
-        std::uint32_t edition;
-        std::vector<LanguageBase> shown;
-    } rows[] = {
+    const std::pair<std::uint32_t, std::vector<LanguageBase>> rows[] = {
         {0, {kUsEnglish}},
         {5, {kJapanese}},
-        {3, {kTraditionalChinese, kThai, kKorean, kUsEnglish}},
-    };
-    for (const auto& row : rows) {
-        SCOPED_TRACE(row.edition);
+        {3, {kTraditionalChinese, kThai, kKorean, kUsEnglish}}};
+    for (const auto& [edition, expected] : rows) {
+        SCOPED_TRACE(edition);
         std::vector<LanguageBase> shown;
-        for (const ShownLanguage& language : LanguagesShownBy(row.edition)) {
+        for (const ShownLanguage& language : LanguagesShownBy(edition)) {
             EXPECT_EQ(language.pickedAs, kNoLanguage);
             shown.push_back(language.base);
         }
-        EXPECT_EQ(shown, row.shown);
+        EXPECT_EQ(shown, expected);
     }
-    // Edition 2 sends an English product back to the list, so US English is never a menu.
-    const auto edition2 = LanguagesShownBy(2);
-    EXPECT_EQ(edition2.size(), 12u);
-    EXPECT_TRUE(std::none_of(edition2.begin(), edition2.end(), [](const ShownLanguage& language) {
-        return language.base == kUsEnglish;
-    }));
 }
 
-std::vector<std::string> PathsOf(const DiscReport& report) {
-    std::vector<std::string> paths;
-    for (const Finding& finding : report.findings) paths.push_back(finding.path);
-    return paths;
-}
-
+// Each file of edition 1 is checked alone on the sample disc; edition 6 brings in the US
+// English menu for UK English and the help page.
 TEST(DiscChecks, AnEmptyDiscNeedsEveryFileOfItsEdition) {
-    const struct {
-        std::uint32_t edition;
-        std::vector<std::string> paths;
-    } rows[] = {
-        {1,
-         {"AutoPlay.exe", "Launcher\\AutoPlayBack.bmp", "Launcher\\AutoPlayBackSp.bmp",
-          "Setup\\setup.exe", "Setup\\Tolven8.iff", "Setup\\data2.cab", "Support\\Trivex.exe",
-          "Support\\Kelpa.exe", "support\\readme.txt", "support\\Leeme.txt", "Demos\\vemo2.mpg",
-          "Demos\\vemo2duskaro.mpg", "Demos\\vemo2lorrel.mpg"}},
-        {6,
-         {"AutoPlay.exe", "Launcher\\AutoPlayBackNO.bmp", "Launcher\\AutoPlayBackFI.bmp",
-          "Launcher\\AutoPlayBackDN.bmp", "Launcher\\AutoPlayBackUk.bmp",
-          "Launcher\\AutoPlayBack.bmp", "Setup\\setup.exe", "Setup\\Tolven8.iff",
-          "Setup\\data2.cab", "support\\ix help\\IX_Help_Select.htm", "Support\\Kelpa.exe",
-          "support\\readmeNO.txt", "support\\readmeFI.txt", "support\\readmeDN.txt",
-          "support\\readmeUK.txt", "support\\readme.txt", "Demos\\vemo2.mpg",
-          "Demos\\vemo2duskaro.mpg", "Demos\\vemo2lorrel.mpg"}},
-    };
-    for (const auto& row : rows) {
-        SCOPED_TRACE(row.edition);
-        TempFolder disc;
-        WriteFile(disc.Path() / "ORVAK.INI",
-                  "[SKU]\r\nSKU=" + std::to_string(row.edition) + "\r\n");
-        const auto report = CheckDisc(disc.Path(), std::nullopt);
-        ASSERT_TRUE(report);
-        EXPECT_EQ(report->edition, row.edition);
-        EXPECT_EQ(PathsOf(*report), row.paths);
-        EXPECT_TRUE(std::all_of(
-            report->findings.begin(), report->findings.end(), [](const Finding& finding) {
-                return finding.severity == Severity::Error && finding.problem == "missing";
-            }));
-    }
+    TempFolder disc;
+    WriteFile(disc.Path() / "ORVAK.INI", std::string("[SKU]\r\nSKU=6\r\n"));
+    const auto report = CheckDisc(disc.Path(), std::nullopt);
+    ASSERT_TRUE(report);
+    EXPECT_EQ(report->edition, 6u);
+    std::vector<std::string> paths;
+    for (const Finding& finding : report->findings) paths.push_back(finding.path);
+    EXPECT_EQ(paths,
+              (std::vector<std::string>{
+                  "AutoPlay.exe", "Launcher\\AutoPlayBackNO.bmp", "Launcher\\AutoPlayBackFI.bmp",
+                  "Launcher\\AutoPlayBackDN.bmp", "Launcher\\AutoPlayBackUk.bmp",
+                  "Launcher\\AutoPlayBack.bmp", "Setup\\setup.exe", "Setup\\Tolven8.iff",
+                  "Setup\\data2.cab", "support\\ix help\\IX_Help_Select.htm", "Support\\Kelpa.exe",
+                  "support\\readmeNO.txt", "support\\readmeFI.txt", "support\\readmeDN.txt",
+                  "support\\readmeUK.txt", "support\\readme.txt", "Demos\\vemo2.mpg",
+                  "Demos\\vemo2duskaro.mpg", "Demos\\vemo2lorrel.mpg"}));
+    EXPECT_TRUE(std::all_of(report->findings.begin(), report->findings.end(), [](auto& finding) {
+        return finding.severity == Severity::Error && finding.problem == "missing";
+    }));
 }
 
 TEST(DiscChecks, BadBackgroundsFallBackToTheFirstWholeOne) {
     TempFolder disc;
     const fs::path launcher = disc.Path() / "launcher";  // any case, as on Windows
     WriteFile(disc.Path() / "ORVAK.INI", std::string("[SKU]\nSKU=6\n"));
+    // One damage at a time is the sample disc's; here several, and the fallback's order.
     WriteFile(launcher / "AutoPlayBackNO.bmp", BmpFile(640, 480, 24));
     WriteFile(launcher / "AutoPlayBackFI.bmp", BmpFile(640, 480, 8));
     WriteFile(launcher / "AutoPlayBackDN.bmp", BmpFile(320, 240, 32));
-    auto truncated = BmpFile(640, 480, 24);
-    truncated.pop_back();
-    WriteFile(launcher / "AutoPlayBackUk.bmp", truncated);
 
     auto backgroundLines = [&disc] {
         std::vector<std::string> lines;
@@ -425,8 +376,8 @@ TEST(DiscChecks, BadBackgroundsFallBackToTheFirstWholeOne) {
             "Norwegian background instead",
             "Launcher\\AutoPlayBackDN.bmp: 320 x 240 pixels, not 640 x 480; 32-bit, not 24-bit -> "
             "the Danish menu shows the Norwegian background instead",
-            "Launcher\\AutoPlayBackUk.bmp: not a whole bitmap file (truncated or damaged) -> the "
-            "UK English menu shows the Norwegian background instead",
+            "Launcher\\AutoPlayBackUk.bmp: missing -> the UK English menu shows the Norwegian "
+            "background instead",
             "Launcher\\AutoPlayBack.bmp: missing -> the US English menu (after installing in UK "
             "English) shows the Norwegian background instead"}));
 

@@ -35,7 +35,6 @@ TEST(DiscRoot, FilesBesideTheRootMustFitTheirBuffer) {
 
 TEST(CurrentDrive, LetterUpperCasedOrAtSignForNetworkPaths) {
     EXPECT_EQ(DriveLetterOfDirectory(L"d:\\games"), L'D');
-    EXPECT_EQ(DriveLetterOfDirectory(L"C:\\"), L'C');
     EXPECT_EQ(DriveLetterOfDirectory(L"\\\\server\\share"), L'@');
     EXPECT_EQ(DriveLetterOfDirectory(L""), L'@');
     EXPECT_EQ(DriveLetterOfDirectory(L"x"), L'@');

@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <cstring>
 #include <string>
 #include <vector>
 
@@ -13,17 +14,12 @@ using runfromswap::ImageChecksum;
 
 constexpr std::size_t kPe = 0x80;  // where the test images put their PE header
 
-// The smallest image the tool accepts: an MS-DOS header pointing at a PE header whose
-// optional header reaches just past its checksum field.
+// The smallest image the tool accepts: headers that reach just past the checksum field.
 std::vector<std::uint8_t> TinyImage(std::uint16_t magic, std::uint16_t characteristics) {
     std::vector<std::uint8_t> image(kPe + 4 + 20 + 68, 0x5A);
-    image[0] = 'M';
-    image[1] = 'Z';
-    image[0x3C] = kPe;
-    image[0x3D] = image[0x3E] = image[0x3F] = 0;
-    image[kPe] = 'P';
-    image[kPe + 1] = 'E';
-    image[kPe + 2] = image[kPe + 3] = 0;
+    std::memcpy(&image[0], "MZ", 2);
+    std::memcpy(&image[0x3C], "\x80\0\0\0", 4);  // kPe
+    std::memcpy(&image[kPe], "PE\0\0", 4);
     image[kPe + 22] = static_cast<std::uint8_t>(characteristics);
     image[kPe + 23] = static_cast<std::uint8_t>(characteristics >> 8);
     image[kPe + 24] = static_cast<std::uint8_t>(magic);
@@ -36,8 +32,7 @@ std::uint32_t Read32(const std::vector<std::uint8_t>& image, std::size_t at) {
            static_cast<std::uint32_t>(image[at + 3]) << 24;
 }
 
-// The checksum arithmetic itself is checked end to end, against MapFileAndCheckSum on the
-// built programs.
+// The checksum arithmetic is checked end to end against MapFileAndCheckSum.
 TEST(RunFromSwap, SetsBothFlagsKeepsTheOthersAndFixesTheChecksum) {
     for (std::uint16_t magic : {0x10B, 0x20B}) {
         SCOPED_TRACE(magic == 0x10B ? "PE32" : "PE32+");

@@ -1,5 +1,4 @@
-// Files for the host tests: a temporary folder removed at the end of the test, files written
-// into it, and bitmap files of any size and depth.
+// Files for the host tests: a temporary folder, files in it and bitmap files.
 #ifndef AUTOPLAY_TESTS_HOST_TEST_FILES_H
 #define AUTOPLAY_TESTS_HOST_TEST_FILES_H
 
@@ -43,8 +42,7 @@ inline void WriteFile(const std::filesystem::path& path, const std::string& text
     WriteFile(path, std::vector<std::uint8_t>(text.begin(), text.end()));
 }
 
-// A bitmap file with a 40-byte (or a 12-byte core) header, a zero colour table at 8 bits or
-// fewer and zero pixels.
+// A bitmap file with a 40-byte (or a 12-byte core) header and zero colours and pixels.
 inline std::vector<std::uint8_t> BmpFile(std::int32_t width, std::int32_t height,
                                          std::uint16_t bitCount, std::uint32_t headerSize = 40) {
     const std::uint32_t stride = ((static_cast<std::uint32_t>(width) * bitCount + 31) / 32) * 4;

@@ -1,11 +1,9 @@
-// The configuration readers against the real registry and a real ORVAK.INI. How names,
-// LANGIDs and the "-l" option map to languages is tested on the host; here what needs the
-// registry or a file: which value wins, types, lengths and the registry view.
+// The configuration readers against the real registry and a real ORVAK.INI: which value wins,
+// types, lengths and the registry view (how names map to languages: the host tests).
 #include <gtest/gtest.h>
 
 #include <functional>
 #include <string>
-#include <vector>
 
 #include "locale/config_win.h"
 #include "shell/launcher_state.h"
@@ -13,21 +11,8 @@
 
 namespace {
 
-class Configuration : public testing::Test {
+class Configuration : public DiscTest {
   protected:
-    void SetUp() override {
-        DeleteMachineKey(kProductKeyPath);
-        DeleteMachineKey(kUninstallKeyPath);
-        DeleteMachineKey(kLocaleKeyPath);
-        ResetLauncherConfiguration();
-        wcscpy_s(launcher.rootPath, disc.Path().c_str());
-    }
-    void TearDown() override {
-        DeleteMachineKey(kLocaleKeyPath);
-        ResetLauncherConfiguration();
-        launcher.rootPath[0] = L'\0';
-    }
-
     struct Outcome {
         LanguageBase base;
         bool known;
@@ -36,8 +21,6 @@ class Configuration : public testing::Test {
         ReadConfiguration(commandLine);
         return {launcher.languageBase, launcher.languageKnown};
     }
-
-    TempFolder disc;
 };
 
 // How a row stores VEMO_LANGUAGE (or VEMO_SKU) in the product key.
@@ -56,42 +39,43 @@ Store Missing() {
     return [](ScopedMachineKey& key, const wchar_t* name) { RegDeleteValueW(key.Get(), name); };
 }
 
-TEST_F(Configuration, CommandLineOptionWinsOverEveryRegistryValue) {
+// The "-l" option wins; else VEMO_OTHERLANGUAGE when it is a text, and VEMO_LANGUAGE is not
+// read; else VEMO_LANGUAGE; else US English.
+TEST_F(Configuration, TheOptionThenTheOtherLanguageThenTheProductLanguageSettleIt) {
     ScopedMachineKey product(kProductKeyPath);
-    product.SetText(L"VEMO_LANGUAGE", L"French");
-    product.SetText(L"VEMO_OTHERLANGUAGE", L"Danish");
     struct Row {
+        const char* what;
         const wchar_t* line;
+        Store language, other;
         LanguageBase base;
     };
-    for (Row row : {Row{L"-l0407", kGerman}, Row{L"-L0407", kDanish}}) {
-        SCOPED_TRACE(row.base);
+    const Row rows[] = {
+        {"the option", L"-l0407", Text(L"French"), Text(L"Danish"), kGerman},
+        {"no option with a capital L", L"-L0407", Text(L"French"), Text(L"Danish"), kDanish},
+        {"a Nordic other language", L"", Text(L"German"), Text(L"Norwegian"), kNorwegian},
+        {"any other other language", L"", Text(L"German"), Text(L"Swedish"), kUkEnglish},
+        {"an other language that is no text", L"", Text(L"German"), Dword(17000), kGerman},
+        {"Japanese", L"", Text(L"Japanese"), Missing(), kJapanese},
+        {"a name only the other value carries", L"", Text(L"Norwegian"), Missing(), kUsEnglish},
+        {"no value", L"", Missing(), Missing(), kUsEnglish},
+        {"a number", L"", Dword(11000), Missing(), kUsEnglish},
+        // Stored data need not end in NUL; a text that fills the whole buffer with no room
+        // for its end, or one longer than the buffer, is no language name.
+        {"German without its terminator", L"", Unterminated(L"German"), Missing(), kGerman},
+        {"256 characters without a terminator", L"", Unterminated(std::wstring(256, L'G')),
+         Missing(), kUsEnglish},
+        {"4000 characters", L"", Text(std::wstring(4000, L'x')), Missing(), kUsEnglish},
+    };
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.what);
         ResetLauncherConfiguration();
+        row.language(product, L"VEMO_LANGUAGE");
+        row.other(product, L"VEMO_OTHERLANGUAGE");
         Outcome outcome = Read(row.line);
         EXPECT_EQ(outcome.base, row.base);
         EXPECT_TRUE(outcome.known);
         EXPECT_FALSE(launcher.useSystemLanguage);
     }
-}
-
-TEST_F(Configuration, OtherLanguageValueWinsAndVemoLanguageIsNotRead) {
-    ScopedMachineKey product(kProductKeyPath);
-    product.SetText(L"VEMO_LANGUAGE", L"German");
-    struct Row {
-        const wchar_t* other;
-        LanguageBase base;
-    };
-    for (Row row : {Row{L"Norwegian", kNorwegian}, Row{L"Swedish", kUkEnglish}}) {
-        SCOPED_TRACE(row.base);
-        ResetLauncherConfiguration();
-        product.SetText(L"VEMO_OTHERLANGUAGE", row.other);
-        Outcome outcome = Read();
-        EXPECT_EQ(outcome.base, row.base);
-        EXPECT_TRUE(outcome.known);
-    }
-    ResetLauncherConfiguration();
-    product.SetDword(L"VEMO_OTHERLANGUAGE", 17000);  // not a text: absent
-    EXPECT_EQ(Read().base, kGerman);
 }
 
 TEST_F(Configuration, DiscEditionTwoOffersTheListUnlessTheProductIsInAnotherLanguage) {
@@ -104,11 +88,8 @@ TEST_F(Configuration, DiscEditionTwoOffersTheListUnlessTheProductIsInAnotherLang
     };
     // English, and anything that reads as US English, sends edition 2 to the list.
     const Row rows[] = {
-        {"UKEnglish", Text(L"UKEnglish"), true},
-        {"USEnglish", Text(L"USEnglish"), true},
-        {"an unknown name", Text(L"Klingon"), true},
-        {"no value", Missing(), true},
-        {"a number", Dword(3000), true},
+        {"UKEnglish", Text(L"UKEnglish"), true},     {"USEnglish", Text(L"USEnglish"), true},
+        {"an unknown name", Text(L"Klingon"), true}, {"no value", Missing(), true},
         {"German", Text(L"German"), false},
     };
     for (const Row& row : rows) {
@@ -123,36 +104,7 @@ TEST_F(Configuration, DiscEditionTwoOffersTheListUnlessTheProductIsInAnotherLang
     }
 }
 
-TEST_F(Configuration, ProductKeySettlesItsLanguageOrUsEnglish) {
-    ScopedMachineKey product(kProductKeyPath);
-    struct Row {
-        const char* what;
-        Store store;
-        LanguageBase base;
-    };
-    const Row rows[] = {
-        {"Japanese", Text(L"Japanese"), kJapanese},
-        {"a name only the other value carries", Text(L"Norwegian"), kUsEnglish},
-        {"no value", Missing(), kUsEnglish},
-        {"a number", Dword(11000), kUsEnglish},
-        // Stored data need not end in NUL; a text that fills the whole buffer with no room
-        // for its end, or one longer than the buffer, is no language name.
-        {"German without its terminator", Unterminated(L"German"), kGerman},
-        {"256 characters without a terminator", Unterminated(std::wstring(256, L'G')), kUsEnglish},
-        {"4000 characters", Text(std::wstring(4000, L'x')), kUsEnglish},
-    };
-    for (const Row& row : rows) {
-        SCOPED_TRACE(row.what);
-        ResetLauncherConfiguration();
-        row.store(product, L"VEMO_LANGUAGE");
-        Outcome outcome = Read();
-        EXPECT_EQ(outcome.base, row.base);
-        EXPECT_TRUE(outcome.known);
-    }
-}
-
-// A 32-bit installer writes to the 32-bit view; a value only in the 64-bit view is none of the
-// product's, whichever build of the launcher reads it.
+// A 32-bit installer writes to the 32-bit view, whichever build of the launcher reads it.
 TEST_F(Configuration, ProductKeysAreReadFromTheThirtyTwoBitView) {
     {
         ScopedMachineKey product(kProductKeyPath, KEY_WOW64_32KEY);
@@ -204,34 +156,29 @@ TEST_F(Configuration, ProductEditionFromTheFirstByteOfVemoSku) {
 }
 
 TEST_F(Configuration, LocaleValueNamesTheMenuLanguageWithoutItsTerminator) {
-    struct Row {
-        LanguageBase base;
-        std::wstring code;
-    };
-    for (const Row& row : {Row{kTraditionalChinese, L"zh_TW"}, Row{kJapanese, L"ja"}}) {
-        SCOPED_TRACE(row.base);
-        launcher.languageBase = row.base;
-        WriteLocale();
-        HKEY key = nullptr;
-        ASSERT_EQ(
-            RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ | KEY_WOW64_32KEY, &key),
-            ERROR_SUCCESS);
-        wchar_t data[32] = {};
-        DWORD size = sizeof(data);
-        DWORD type = 0;
-        ASSERT_EQ(RegQueryValueExW(key, L"", nullptr, &type, reinterpret_cast<BYTE*>(data), &size),
-                  ERROR_SUCCESS);
-        RegCloseKey(key);
-        EXPECT_EQ(type, static_cast<DWORD>(REG_SZ));
-        DWORD written = static_cast<DWORD>(row.code.size() * sizeof(wchar_t));
-        // Wine stores a terminator after text data that is followed by one in memory,
-        // whatever length it is given; Windows stores exactly the length given.
-        if (RunningOnWine() && size == written + sizeof(wchar_t) && data[row.code.size()] == 0) {
-            size = written;
-        }
-        EXPECT_EQ(size, written);
-        EXPECT_EQ(std::wstring(data, size / sizeof(wchar_t)), row.code);
+    // Each language's code, read back, is the end-to-end language choices'.
+    const std::wstring code = L"zh_TW";
+    launcher.languageBase = kTraditionalChinese;
+    WriteLocale();
+    HKEY key = nullptr;
+    ASSERT_EQ(
+        RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ | KEY_WOW64_32KEY, &key),
+        ERROR_SUCCESS);
+    wchar_t data[32] = {};
+    DWORD size = sizeof(data);
+    DWORD type = 0;
+    ASSERT_EQ(RegQueryValueExW(key, L"", nullptr, &type, reinterpret_cast<BYTE*>(data), &size),
+              ERROR_SUCCESS);
+    RegCloseKey(key);
+    EXPECT_EQ(type, static_cast<DWORD>(REG_SZ));
+    const DWORD written = static_cast<DWORD>(code.size() * sizeof(wchar_t));
+    // Wine stores a terminator after text data that is followed by one in memory, whatever
+    // length it is given; Windows stores exactly the length given.
+    if (RunningOnWine() && size == written + sizeof(wchar_t) && data[code.size()] == 0) {
+        size = written;
     }
+    EXPECT_EQ(size, written);
+    EXPECT_EQ(std::wstring(data, size / sizeof(wchar_t)), code);
     HKEY other = nullptr;
     EXPECT_NE(
         RegOpenKeyExW(HKEY_LOCAL_MACHINE, kLocaleKeyPath, 0, KEY_READ | KEY_WOW64_64KEY, &other),

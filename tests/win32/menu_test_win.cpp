@@ -1,6 +1,5 @@
-// The picture buttons and the menu controller in this process: the pictures and hit circles
-// each screen's buttons take, how buttons draw (read back as pixels), the installation check
-// against the real registry, and a screen built while memory runs out.
+// The picture buttons and the menu controller in this process: pictures, hit circles, drawing,
+// the installation check against the real registry, and a screen built out of memory.
 #include <gtest/gtest.h>
 
 #include <atomic>
@@ -10,6 +9,7 @@
 #include "graphics/masked_blend.h"
 #include "locale/catalogue_win.h"
 #include "locale/config_win.h"
+#include "locale/picture_ids.h"
 #include "menu/menu_controller.h"
 #include "shell/launcher_state.h"
 #include "test_support_win.h"
@@ -42,23 +42,6 @@ void operator delete(void* block, std::size_t) noexcept {
 
 namespace {
 
-// A 24-bit picture whose pixels all differ from their neighbours, so a rectangle copied from
-// the wrong place shows.
-std::string PatternBmpFile(int width, int height) {
-    std::string file = SolidBmpFile(width, height, {0, 0, 0});
-    const std::size_t stride = (static_cast<std::size_t>(width) * 3 + 3) & ~std::size_t{3};
-    const std::size_t pixels = file.size() - stride * static_cast<std::size_t>(height);
-    for (int row = 0; row < height; ++row) {
-        for (int x = 0; x < width; ++x) {
-            char* p = &file[pixels + static_cast<std::size_t>(row) * stride + x * 3];
-            p[0] = static_cast<char>(x * 7 + row * 3);
-            p[1] = static_cast<char>(x ^ row);
-            p[2] = static_cast<char>(row * 5 + x);
-        }
-    }
-    return file;
-}
-
 // The compositing rule written out plainly, pixel by pixel.
 Rgb Composite(Rgb a, Rgb b, std::uint8_t m) {
     if (m == 0) return b;
@@ -82,14 +65,17 @@ LRESULT CALLBACK CountingButtonProc(HWND window, UINT message, WPARAM wParam, LP
     return CallWindowProcW(buttonProc, window, message, wParam, lParam);
 }
 
-class MenuTest : public testing::Test {
+class MenuTest : public DiscTest {
   protected:
     void SetUp() override {
-        ResetLauncherConfiguration();
-        DeleteMachineKey(kProductKeyPath);
-        DeleteMachineKey(kLocaleKeyPath);
-        wcscpy_s(launcher.rootPath, disc.Path().c_str());
-        disc.WriteFile(FindLanguage(kUsEnglish)->backgroundFile, PatternBmpFile(640, 480));
+        DiscTest::SetUp();
+        // Pixels that differ from their neighbours, so a rectangle copied from the wrong place
+        // shows.
+        disc.WriteFile(FindLanguage(kUsEnglish)->backgroundFile,
+                       BmpFile(640, 480, 24, [](int x, int y) {
+                           return Rgb{std::uint8_t(y * 5 + x), std::uint8_t(x ^ y),
+                                      std::uint8_t(x * 7 + y * 3)};
+                       }));
         LoadCatalogue();
         WNDCLASSW parentClass{};
         parentClass.lpfnWndProc = DefWindowProcW;
@@ -99,7 +85,6 @@ class MenuTest : public testing::Test {
         parent = CreateWindowExW(0, L"MenuTestParent", L"", WS_POPUP | WS_VISIBLE, 0, 0, 640, 480,
                                  nullptr, nullptr, launcher.instance, nullptr);
         launcher.mainWindow = parent;
-        launcher.openPanel = kNoPanel;
         launcher.languageBase = kUsEnglish;
         launcher.languageKnown = true;
         launcher.discSku = 1;
@@ -108,9 +93,7 @@ class MenuTest : public testing::Test {
         menu->DestroyAllButtons();
         DestroyWindow(parent);
         launcher.mainWindow = nullptr;
-        ReleaseCatalogue();
-        DeleteMachineKey(kProductKeyPath);
-        DeleteMachineKey(kLocaleKeyPath);
+        DiscTest::TearDown();
     }
 
     // A controller as start-up makes it.
@@ -124,13 +107,6 @@ class MenuTest : public testing::Test {
         }
         return nullptr;
     }
-    std::vector<std::uint32_t> VisibleIds(std::int32_t page) {
-        std::vector<std::uint32_t> ids;
-        for (LauncherButton* button : menu->pages[static_cast<std::size_t>(page)]) {
-            if (button->visible) ids.push_back(button->id);
-        }
-        return ids;
-    }
     int ChildWindows() {
         int count = 0;
         EnumChildWindows(parent, CountWindow, reinterpret_cast<LPARAM>(&count));
@@ -139,7 +115,6 @@ class MenuTest : public testing::Test {
     // The state a paint leaves: the working copy holds the pristine background.
     void Repaint() { CopyDibPixels(launcher.workingBackground.get(), BackgroundFor(kUsEnglish)); }
 
-    TempFolder disc;
     HWND parent = nullptr;
     std::unique_ptr<MenuController> menu = std::make_unique<MenuController>();
 };
@@ -158,23 +133,6 @@ TEST_F(MenuTest, ShowCallsShowWindowOnlyOnAChangeAndSetWantedSaysWhetherItChange
     EXPECT_FALSE(button.SetWanted(true)) << "wanted from the start";
     EXPECT_TRUE(button.SetWanted(false));
     EXPECT_FALSE(button.SetWanted(false));
-}
-
-TEST_F(MenuTest, ACircularButtonIsHitStrictlyInsideItsCircleOnTheScreen) {
-    VemoLauncherButton button(parent, 0, 101, 1, 186, 162, 85, 96, true, kActiveLanguage);
-    POINT origin{0, 0};
-    ClientToScreen(parent, &origin);
-    const int cx = origin.x + 186 + 40, cy = origin.y + 162 + 50;
-    EXPECT_FALSE(button.HitTest(cx, cy)) << "no circle before SetCircle";
-    button.SetCircle(40, 50, 35);
-    EXPECT_TRUE(button.HitTest(cx, cy));
-    EXPECT_TRUE(button.HitTest(cx + 34, cy));
-    EXPECT_FALSE(button.HitTest(cx + 35, cy)) << "a point at the radius is outside";
-    EXPECT_FALSE(button.HitTest(cx, cy - 35));
-    EXPECT_TRUE(button.IsShaped());
-    LauncherButton plate(parent, 0, 601, 0, 10, 10, 209, 49, true, kActiveLanguage);
-    EXPECT_FALSE(plate.IsShaped());
-    EXPECT_TRUE(plate.HitTest(-5000, -5000));
 }
 
 TEST_F(MenuTest, ButtonsDrawTheirFaceCompositedOverTheBackgroundByThePlainRule) {
@@ -260,53 +218,35 @@ TEST_F(MenuTest, ALatchedPlateShowsItsNormalFaceAndAButtonWithoutPicturesDrawsNo
 }
 
 // Which buttons each screen shows, where and with which labels, is checked on the real
-// launcher; here what only this process sees: the pictures and the hit circles.
-TEST_F(MenuTest, EachButtonTakesItsPictureAndCircularButtonsTheirHitCircle) {
-    struct Row {
-        std::uint32_t id;
-        std::int32_t image;
-        HitCircle circle;  // radius 0: a plate
-    };
-    const Row rows[] = {
-        {1000, 11, {74, 54, 60}},
-        {101, 0, {40, 50, 35}},
-        {102, 1, {40, 50, 35}},
-        {103, 7, {33, 42, 29}},
-        {107, 6, {29, 31, 31}},
-        {108, 9, {37, 48, 26}},
-        {110, 10, {26, 25, 23}},
-        {303, 4, {}},
-        {302, 5, {}},
-        {301, 6, {}},
-        {601, 0, {}},
-        {602, 1, {}},
-        {603, 2, {}},
-        {150, 9, {}},
-        {151, 8, {}},
-        {152, 10, {}},
-    };
-    menu->BuildMainMenu(parent);
-    for (const Row& row : rows) {
-        SCOPED_TRACE(row.id);
-        LauncherButton* button = Button(row.id);
-        ASSERT_TRUE(button);
-        EXPECT_EQ(button->imageIndex, row.image);
-        ASSERT_EQ(button->IsShaped(), row.circle.radius != 0);
-        if (!button->IsShaped()) continue;
-        auto* circular = static_cast<VemoLauncherButton*>(button);
-        EXPECT_EQ(circular->centerX, row.circle.centerX);
-        EXPECT_EQ(circular->centerY, row.circle.centerY);
-        EXPECT_EQ(circular->radius, row.circle.radius);
+// launcher; here that each button takes the picture and hit circle of its layout entry.
+TEST_F(MenuTest, EachButtonTakesThePictureAndHitCircleOfItsLayout) {
+    std::vector<PanelButtonSpec> plates = InfoPanelButtons();
+    for (const auto& more : {GamesPanelButtons(), PlayPanelButtons()}) {
+        plates.insert(plates.end(), more.begin(), more.end());
     }
-    // The Play picture by language.
-    const std::pair<LanguageBase, std::int32_t> pictures[] = {
-        {kFrench, 4}, {kGerman, 2}, {kSpanish, 5}, {kJapanese, 3}, {kUkEnglish, 1}, {kPolish, 1}};
-    for (auto [base, image] : pictures) {
+    for (LanguageBase base : {kUsEnglish, kFrench}) {  // the Play picture follows the language
         SCOPED_TRACE(base);
         Fresh();
         launcher.languageBase = base;
         menu->BuildMainMenu(parent);
-        EXPECT_EQ(Button(102)->imageIndex, image);
+        for (const MainButtonSpec& spec :
+             MainPageButtons(launcher.discSku, launcher.productSku, base)) {
+            SCOPED_TRACE(spec.button.id);
+            LauncherButton* button = Button(spec.button.id);
+            ASSERT_TRUE(button && button->IsShaped());
+            EXPECT_EQ(button->imageIndex, spec.button.imageIndex);
+            auto* circular = static_cast<VemoLauncherButton*>(button);
+            const HitCircle& circle = spec.button.circle;
+            EXPECT_EQ(circular->centerX, circle.centerX);
+            EXPECT_EQ(circular->centerY, circle.centerY);
+            EXPECT_EQ(circular->radius, circle.radius);
+        }
+        for (const PanelButtonSpec& spec : plates) {
+            SCOPED_TRACE(spec.id);
+            ASSERT_TRUE(Button(spec.id));
+            EXPECT_FALSE(Button(spec.id)->IsShaped());
+            EXPECT_EQ(Button(spec.id)->imageIndex, PanelSlotFor(spec.page, spec.slot)->imageIndex);
+        }
     }
     // The language list's plates in order, each name drawn in its own language's font, and the
     // list's own About button.
@@ -319,22 +259,32 @@ TEST_F(MenuTest, EachButtonTakesItsPictureAndCircularButtonsTheirHitCircle) {
     ASSERT_EQ(page.size(), 13u);
     for (std::size_t i = 0; i + 1 < page.size(); ++i) {
         SCOPED_TRACE(page[i]->id);
-        EXPECT_EQ(page[i]->imageIndex, static_cast<std::int32_t>(11 + i));
+        EXPECT_EQ(page[i]->imageIndex, static_cast<std::int32_t>(kFirstListPlate + i));
         EXPECT_EQ(page[i]->labelLanguage, *LanguageOfCommand(page[i]->id));
     }
-    EXPECT_EQ(page.back()->imageIndex, 12);
+    EXPECT_EQ(page.back()->imageIndex, kListAboutIconKey);
 }
 
-TEST_F(MenuTest, ALanguageIsChosenOnceAndTheListsAboutButtonIsTheOneDrawn) {
-    launcher.languageBase = kNoLanguage;
+TEST_F(MenuTest, OnTheListTheCheckChangesNoButtonALanguageIsChosenOnceAndItsAboutIsDrawn) {
+    TempFolder game;
+    game.WriteFile(L"Vemo.exe", "MZ");
+    ScopedMachineKey key(kProductKeyPath);
+    key.SetText(L"Version", L"1.0");
+    key.SetDword(L"EP8Installed", 1);
+    key.SetText(L"VEMO_DATA", game.Path().substr(0, game.Path().size() - 1));
     launcher.languageKnown = false;
-    launcher.discSku = 2;
+    launcher.languageBase = kNoLanguage;
     menu->StartLanguageList(parent);
-    menu->OnCommand(502);  // Deutsch
-    ASSERT_EQ(launcher.languageBase, kGerman);
+    EXPECT_TRUE(menu->installed);
+    EXPECT_EQ(menu->installIndex, -1);
+    for (LauncherButton* button : menu->pages[LanguagePage]) {
+        EXPECT_EQ(button->visible, button->id != 1000) << button->id;  // 500 and 506
+    }
+    menu->OnCommand(506);  // Español
+    ASSERT_EQ(launcher.languageBase, kSpanish);
     const std::size_t buttons = menu->allButtons.size();
-    menu->OnCommand(501);  // the choice is made once
-    EXPECT_EQ(launcher.languageBase, kGerman);
+    menu->OnCommand(500);  // the choice is made once
+    EXPECT_EQ(launcher.languageBase, kSpanish);
     EXPECT_EQ(menu->allButtons.size(), buttons);
     // Both About buttons share id 1000: the list's, created first, is the one drawn.
     Surface surface(162, 117);
@@ -445,21 +395,6 @@ TEST_F(MenuTest, TheGameCountsAsInstalledWithItsValuesAndAProgramThatOpens) {
         menu->CheckInstallation();
         EXPECT_TRUE(menu->installed);
     }
-}
-
-TEST_F(MenuTest, BeforeTheMainMenuExistsTheCheckChangesNoButton) {
-    TempFolder game;
-    game.WriteFile(L"Vemo.exe", "MZ");
-    ScopedMachineKey key(kProductKeyPath);
-    key.SetText(L"Version", L"1.0");
-    key.SetDword(L"EP8Installed", 1);
-    key.SetText(L"VEMO_DATA", game.Path().substr(0, game.Path().size() - 1));
-    launcher.languageKnown = false;
-    launcher.languageBase = kNoLanguage;
-    menu->StartLanguageList(parent);
-    EXPECT_TRUE(menu->installed);
-    EXPECT_EQ(menu->installIndex, -1);
-    EXPECT_EQ(VisibleIds(LanguagePage), (std::vector<std::uint32_t>{500, 506}));
 }
 
 }  // namespace

@@ -5,6 +5,8 @@
 #include <cstring>
 
 #include "graphics/dib.h"
+#include "locale/catalogue_win.h"
+#include "locale/config_win.h"
 #include "platform/text_win.h"
 #include "shell/launcher_state.h"
 
@@ -43,32 +45,16 @@ ScopedMachineKey::~ScopedMachineKey() {
     DeleteMachineKey(path_.c_str(), view_);
 }
 
-void ScopedMachineKey::SetText(const wchar_t* name, const std::wstring& text) {
-    DWORD bytes = static_cast<DWORD>((text.size() + 1) * sizeof(wchar_t));
-    ASSERT_EQ(
-        RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.c_str()), bytes),
-        ERROR_SUCCESS);
+void ScopedMachineKey::Set(const wchar_t* name, DWORD type, const void* data, DWORD size) {
+    ASSERT_EQ(RegSetValueExW(key_, name, 0, type, static_cast<const BYTE*>(data), size),
+              ERROR_SUCCESS);
 }
 
 void ScopedMachineKey::SetUnterminatedText(const wchar_t* name, const std::wstring& text) {
     // Wine quietly adds the terminator when the character after the data is NUL, so the
     // data is followed by something else here.
-    std::wstring guarded = text + L"#";
-    DWORD bytes = static_cast<DWORD>(text.size() * sizeof(wchar_t));
-    ASSERT_EQ(
-        RegSetValueExW(key_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(guarded.data()), bytes),
-        ERROR_SUCCESS);
-}
-
-void ScopedMachineKey::SetDword(const wchar_t* name, DWORD value) {
-    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_DWORD, reinterpret_cast<const BYTE*>(&value),
-                             sizeof(value)),
-              ERROR_SUCCESS);
-}
-
-void ScopedMachineKey::SetBinary(const wchar_t* name, const void* data, DWORD size) {
-    ASSERT_EQ(RegSetValueExW(key_, name, 0, REG_BINARY, static_cast<const BYTE*>(data), size),
-              ERROR_SUCCESS);
+    const std::wstring guarded = text + L"#";
+    Set(name, REG_SZ, guarded.data(), static_cast<DWORD>(text.size() * sizeof(wchar_t)));
 }
 
 TempFolder::TempFolder() {
@@ -160,6 +146,24 @@ void ResetLauncherMenu() {
     launcher.buttonsRefreshed = false;
 }
 
+void DiscTest::SetUp() {
+    for (const wchar_t* key : {kProductKeyPath, kUninstallKeyPath, kLocaleKeyPath}) {
+        DeleteMachineKey(key);
+    }
+    ResetLauncherConfiguration();
+    ResetLauncherMenu();
+    launcher.openPanel = kNoPanel;
+    wcscpy_s(launcher.rootPath, disc.Path().c_str());
+}
+
+void DiscTest::TearDown() {
+    ReleaseCatalogue();
+    for (const wchar_t* key : {kProductKeyPath, kUninstallKeyPath, kLocaleKeyPath}) {
+        DeleteMachineKey(key);
+    }
+    launcher.rootPath[0] = L'\0';
+}
+
 bool RunningOnWine() {
     HMODULE ntdll = GetModuleHandleW(L"ntdll.dll");
     return ntdll && GetProcAddress(ntdll, "wine_get_version") != nullptr;
@@ -174,31 +178,43 @@ std::ostream& operator<<(std::ostream& out, const Rgb& color) {
     return out << "(" << int(color.r) << "," << int(color.g) << "," << int(color.b) << ")";
 }
 
-std::string SolidBmpFile(int width, int height, Rgb color) {
-    const std::uint32_t stride = (static_cast<std::uint32_t>(width) * 3 + 3) & ~3u;
-    const std::uint32_t imageSize = stride * static_cast<std::uint32_t>(height);
-    std::string file(14 + 40 + imageSize, '\0');
+std::string BmpFile(int width, int height, int depth,
+                    const std::function<Rgb(int x, int y)>& pixel) {
+    const std::uint32_t bytes = static_cast<std::uint32_t>(depth) / 8;
+    const std::uint32_t stride = (static_cast<std::uint32_t>(width) * bytes + 3) & ~3u;
+    const std::uint32_t offset = 54 + (depth == 8 ? 1024 : 0);
+    std::string file(offset + stride * static_cast<std::uint32_t>(height), '\0');
     auto put32 = [&](std::size_t at, std::uint32_t v) { std::memcpy(&file[at], &v, 4); };
-    auto put16 = [&](std::size_t at, std::uint16_t v) { std::memcpy(&file[at], &v, 2); };
     file[0] = 'B';
     file[1] = 'M';
     put32(2, static_cast<std::uint32_t>(file.size()));
-    put32(10, 54);
+    put32(10, offset);
     put32(14, 40);
     put32(18, static_cast<std::uint32_t>(width));
     put32(22, static_cast<std::uint32_t>(height));
-    put16(26, 1);
-    put16(28, 24);
-    put32(34, imageSize);
+    file[26] = 1;
+    file[28] = static_cast<char>(depth);
+    put32(34, stride * static_cast<std::uint32_t>(height));
+    for (std::uint32_t level = 0; depth == 8 && level < 256; ++level) {
+        put32(54 + level * 4, level * 0x010101u);
+    }
     for (int y = 0; y < height; ++y) {
         for (int x = 0; x < width; ++x) {
-            std::size_t at = 54 + y * stride + x * 3;
-            file[at] = static_cast<char>(color.b);
-            file[at + 1] = static_cast<char>(color.g);
-            file[at + 2] = static_cast<char>(color.r);
+            const Rgb color = pixel(x, y);
+            char* p = &file[offset + static_cast<std::uint32_t>(height - 1 - y) * stride +
+                            static_cast<std::uint32_t>(x) * bytes];
+            p[0] = static_cast<char>(color.b);
+            if (depth == 24) {
+                p[1] = static_cast<char>(color.g);
+                p[2] = static_cast<char>(color.r);
+            }
         }
     }
     return file;
+}
+
+std::string SolidBmpFile(int width, int height, Rgb color) {
+    return BmpFile(width, height, 24, [color](int, int) { return color; });
 }
 
 Rgb TestColorOf(LanguageBase base) {

@@ -1,5 +1,4 @@
-// Helpers shared by the Windows tests: registry keys and folders that clean up after
-// themselves, and a way back to a fresh launcher state between tests.
+// Helpers shared by the Windows tests: self-cleaning keys and folders, fresh launcher state.
 #ifndef AUTOPLAY_TESTS_TEST_SUPPORT_WIN_H
 #define AUTOPLAY_TESTS_TEST_SUPPORT_WIN_H
 
@@ -7,6 +6,7 @@
 #include <windows.h>
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <ostream>
 #include <string>
@@ -15,17 +15,14 @@
 #include "platform/handles_win.h"
 #include "platform/registry_win.h"
 
-// Deletes an HKEY_LOCAL_MACHINE key with everything below it; absent keys are fine. Keys are
-// in the product's registry view (the 32-bit one) unless a test asks for the other.
+// Deletes an HKLM key and all below it, if there, in the product's (32-bit) view unless told.
 void DeleteMachineKey(const wchar_t* path, REGSAM view = kProductRegistryView);
 
-// A REG_SZ value of an HKEY_LOCAL_MACHINE key (empty name: the default value), also when it
-// was stored without its terminator; nothing when the key or value is missing.
+// A REG_SZ value of an HKLM key, terminated or not; nothing when the key or value is missing.
 std::optional<std::wstring> MachineText(const wchar_t* path, const wchar_t* name,
                                         REGSAM view = kProductRegistryView);
 
-// An HKEY_LOCAL_MACHINE key created for one test and deleted with everything below it when
-// the test ends.
+// An HKEY_LOCAL_MACHINE key deleted with everything below it when the test ends.
 class ScopedMachineKey {
   public:
     explicit ScopedMachineKey(const wchar_t* path, REGSAM view = kProductRegistryView);
@@ -33,21 +30,26 @@ class ScopedMachineKey {
     ScopedMachineKey(const ScopedMachineKey&) = delete;
     ScopedMachineKey& operator=(const ScopedMachineKey&) = delete;
 
-    void SetText(const wchar_t* name, const std::wstring& text);
+    void SetText(const wchar_t* name, const std::wstring& text) {
+        Set(name, REG_SZ, text.c_str(), static_cast<DWORD>((text.size() + 1) * sizeof(wchar_t)));
+    }
     // Stores the characters without a terminating NUL in the data.
     void SetUnterminatedText(const wchar_t* name, const std::wstring& text);
-    void SetDword(const wchar_t* name, DWORD value);
-    void SetBinary(const wchar_t* name, const void* data, DWORD size);
+    void SetDword(const wchar_t* name, DWORD value) { Set(name, REG_DWORD, &value, sizeof value); }
+    void SetBinary(const wchar_t* name, const void* data, DWORD size) {
+        Set(name, REG_BINARY, data, size);
+    }
     HKEY Get() const { return key_; }
 
   private:
+    void Set(const wchar_t* name, DWORD type, const void* data, DWORD size);
+
     std::wstring path_;
     REGSAM view_;
     HKEY key_ = nullptr;
 };
 
-// A new empty folder under %TEMP%, removed with its contents when the test ends (programs
-// started from it get a few seconds to close first).
+// A new folder under %TEMP%, removed when the test ends (once programs in it have closed).
 class TempFolder {
   public:
     TempFolder();
@@ -66,13 +68,20 @@ class TempFolder {
     std::wstring path_;
 };
 
-// Deletes a folder and everything in it.
 void RemoveTree(const std::wstring& folder);
 
 // Puts the launcher's configuration fields back to their start values.
 void ResetLauncherConfiguration();
 // Destroys the menu's buttons and puts its fields back to their start values.
 void ResetLauncherMenu();
+
+// From the launcher's start values, without its keys, on a disc of its own; released after.
+class DiscTest : public testing::Test {
+  protected:
+    void SetUp() override;
+    void TearDown() override;
+    TempFolder disc;
+};
 
 struct Rgb {
     std::uint8_t r, g, b;
@@ -81,7 +90,9 @@ struct Rgb {
 };
 std::ostream& operator<<(std::ostream& out, const Rgb& color);
 
-// A 24-bit .bmp file of one colour, as a disc would carry a background.
+// A 24-bit .bmp file, or 8-bit with a grey table (the level in b); y counted from the top.
+std::string BmpFile(int width, int height, int depth,
+                    const std::function<Rgb(int x, int y)>& pixel);
 std::string SolidBmpFile(int width, int height, Rgb color);
 // A colour of its own for each language, so a test can tell which background shows.
 Rgb TestColorOf(LanguageBase base);
@@ -90,8 +101,7 @@ Rgb ScreenPixel(int x, int y);
 // The header of a 32-bit top-down picture, the layout tests read pixels in.
 BITMAPINFO TopDownInfo(int width, int height);
 
-// A 32-bit top-down memory surface that a window or a button is painted into, read back as
-// pixels.
+// A 32-bit top-down memory surface to paint into and read back as pixels.
 class Surface {
   public:
     Surface(int width, int height);

@@ -1,6 +1,5 @@
-// The launcher's window procedure in this process: activation, the paint with the installed
-// game's caption, the palette messages, the redraw of every button after a paint, and a
-// shutdown that leaves nothing behind.
+// The launcher's window procedure in this process: activation, the installed game's caption,
+// palette messages, and a shutdown that leaves nothing behind.
 #include <gtest/gtest.h>
 
 #include <cstdlib>
@@ -18,13 +17,10 @@ namespace {
 
 bool PaletteDisplay() { return std::getenv("AUTOPLAY_EXPECT_PALETTE_DISPLAY") != nullptr; }
 
-class LauncherWindowProc : public testing::Test {
-protected:
+class LauncherWindowProc : public DiscTest {
+  protected:
     void SetUp() override {
-        ResetLauncherConfiguration();
-        ResetLauncherMenu();
-        DeleteMachineKey(kProductKeyPath);
-        wcscpy_s(launcher.rootPath, disc.Path().c_str());
+        DiscTest::SetUp();
         disc.WriteFile(FindLanguage(kUsEnglish)->backgroundFile,
                        SolidBmpFile(640, 480, {250, 250, 250}));
         LoadCatalogue();
@@ -39,7 +35,6 @@ protected:
                                  nullptr, nullptr, launcher.instance, nullptr);
         ASSERT_TRUE(window);
         launcher.mainWindow = window;
-        launcher.openPanel = kNoPanel;
         launcher.languageBase = kUsEnglish;
         launcher.languageKnown = true;
         launcher.discSku = 1;
@@ -51,7 +46,7 @@ protected:
         UniqueHandle noMutex;
         ShutDownLauncher(noMutex, launcher.instance);
         ResetLauncherMenu();
-        DeleteMachineKey(kProductKeyPath);
+        DiscTest::TearDown();
     }
 
     // Handles what the window has been sent, within a bound.
@@ -101,7 +96,6 @@ protected:
         return size.cx;
     }
 
-    TempFolder disc;
     TempFolder game;
     std::unique_ptr<ScopedMachineKey> product;
     HWND window = nullptr;
@@ -152,40 +146,6 @@ TEST_F(LauncherWindowProc, BecomingActiveOnAPaletteDisplayRealisesThePalette) {
         EXPECT_EQ(changed, 0);
     }
     EXPECT_EQ(GetUpdateRect(window, nullptr, FALSE) != FALSE, changed == 1);
-}
-
-TEST_F(LauncherWindowProc, AfterEachPaintEveryButtonRedrawsItselfCompletelyOnce) {
-    for (const auto& button : launcher.menu.allButtons) button->lastState = kNormal;
-    Button(108)->latched = true;
-    Button(108)->lastState = kLatched;
-    HDC memory = CreateCompatibleDC(nullptr);
-    SendMessageW(window, WM_PRINTCLIENT, reinterpret_cast<WPARAM>(memory), PRF_CLIENT);
-    EXPECT_FALSE(launcher.buttonsRefreshed);
-    for (const auto& button : launcher.menu.allButtons) ValidateRect(button->window, nullptr);
-
-    DRAWITEMSTRUCT item{};
-    item.CtlType = ODT_BUTTON;
-    item.CtlID = 110;
-    item.hwndItem = Button(110)->window;
-    item.hDC = memory;
-    item.itemState = 0;
-    SendMessageW(window, WM_DRAWITEM, 110, reinterpret_cast<LPARAM>(&item));
-    EXPECT_TRUE(launcher.buttonsRefreshed);
-    for (const auto& button : launcher.menu.allButtons) {
-        SCOPED_TRACE(button->id);
-        // A hidden window has nothing to redraw; a shown one is asked to.
-        EXPECT_EQ(GetUpdateRect(button->window, nullptr, FALSE) != FALSE, button->visible);
-        if (button->id == 110) {
-            EXPECT_EQ(button->lastState, kNormal);
-        } else {
-            EXPECT_EQ(button->lastState, button->latched ? kLatched : kNotDrawn);
-        }
-    }
-    // The next draw request is only a draw.
-    for (const auto& button : launcher.menu.allButtons) ValidateRect(button->window, nullptr);
-    SendMessageW(window, WM_DRAWITEM, 110, reinterpret_cast<LPARAM>(&item));
-    EXPECT_FALSE(GetUpdateRect(Button(101)->window, nullptr, FALSE));
-    DeleteDC(memory);
 }
 
 TEST_F(LauncherWindowProc, ShutdownLeavesNothingForTheGlobalsToRelease) {
