@@ -16,7 +16,6 @@
 
 #include "launcher_driver_win.h"
 #include "locale/config_win.h"
-#include "shell_associations_win.h"
 #include "test_support_win.h"
 
 namespace {

@@ -6,7 +6,6 @@
 #include <vector>
 
 #include "launcher_driver_win.h"
-#include "shell_associations_win.h"
 
 namespace {
 
