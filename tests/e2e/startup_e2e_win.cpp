@@ -1,5 +1,4 @@
-// The launcher started as a user starts it: from a folder that is not its disc, beside a
-// running game, and twice.
+// The launcher started as a user starts it: from a folder that is not its disc, and twice.
 #include <gtest/gtest.h>
 
 #include "launcher_driver_win.h"
@@ -87,23 +86,6 @@ TEST_F(LauncherStartup, SecondLauncherBringsTheFirstBackRestoredAndInFront) {
     EXPECT_TRUE(
         WaitUntil([&] { return !IsIconic(window) && GetForegroundWindow() == window; }, 5000))
         << "the first launcher stayed minimised or behind";
-}
-
-TEST_F(LauncherStartup, RunningGameMakesItEndWithoutAWord) {
-    WNDCLASSW gameClass{};
-    gameClass.lpfnWndProc = DefWindowProcW;
-    gameClass.hInstance = GetModuleHandleW(nullptr);
-    gameClass.lpszClassName = L"Brask";
-    RegisterClassW(&gameClass);
-    HWND game = CreateWindowExW(0, L"Brask", L"The Vemo", WS_OVERLAPPEDWINDOW, 0, 0, 200, 100,
-                                nullptr, nullptr, GetModuleHandleW(nullptr), nullptr);
-    ASSERT_TRUE(game);
-
-    ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
-    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(TopLevelWindows(launcher.Id()).empty());
-    DestroyWindow(game);
-    UnregisterClassW(L"Brask", GetModuleHandleW(nullptr));
 }
 
 }  // namespace
