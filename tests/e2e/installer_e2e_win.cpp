@@ -1,5 +1,5 @@
-// The sample disc's setup.exe as the launcher and a user start it: what it installs, what it
-// writes for the launcher to read, what it asks, and that "-u" takes it all away again.
+// The launcher started off its disc and twice, and the disc's setup.exe as the launcher and a
+// user start it: what it installs and writes for the launcher, what it asks, and "-u".
 #include <gtest/gtest.h>
 
 #include <optional>
@@ -7,7 +7,7 @@
 
 #include "launcher_driver_win.h"
 #include "locale/config_win.h"
-#include "platform/handles_win.h"
+#include "platform/registry_win.h"
 #include "shell/launcher_state.h"
 #include "test_support_win.h"
 
@@ -16,43 +16,23 @@ namespace {
 constexpr DWORD kUserCancelled = 1602;  // ERROR_INSTALL_USEREXIT
 constexpr DWORD kInstallFailed = 1603;  // ERROR_INSTALL_FAILURE
 
-std::wstring ProgramFilesFolder() {
-    wchar_t folder[MAX_PATH] = {};
-    GetEnvironmentVariableW(L"ProgramFiles", folder, MAX_PATH);
-    return folder;
-}
-
 std::wstring MakerFolder() {
-    return ProgramFilesFolder() + L"\\Orvak";
+    return InstalledFolder(L"");
 }
 std::wstring GameFolder() {
-    return MakerFolder() + L"\\The Vemo";
+    return InstalledFolder(L"The Vemo");
 }
 
-bool Exists(const std::wstring& path) {
-    return GetFileAttributesW(path.c_str()) != INVALID_FILE_ATTRIBUTES;
-}
-
-// setup.exe writes where a 32-bit installer writes: the 32-bit registry view.
-RegistryKey OpenInstallerKey(const wchar_t* path) {
-    HKEY key = nullptr;
-    if (RegOpenKeyExW(HKEY_LOCAL_MACHINE, path, 0, KEY_READ | KEY_WOW64_32KEY, &key) !=
-        ERROR_SUCCESS) {
-        return RegistryKey();
-    }
-    return RegistryKey(key);
-}
-
+// setup.exe writes where a 32-bit installer writes, the product's registry view.
 bool KeyExists(const wchar_t* path) {
-    return static_cast<bool>(OpenInstallerKey(path));
+    return static_cast<bool>(OpenKeyForReading(HKEY_LOCAL_MACHINE, path));
 }
 
-std::optional<DWORD> DwordValue(const wchar_t* keyPath, const wchar_t* name) {
-    RegistryKey key = OpenInstallerKey(keyPath);
-    DWORD value = 0;
-    DWORD bytes = sizeof(value);
-    if (!key || RegGetValueW(key.Get(), nullptr, name, RRF_RT_REG_DWORD, nullptr, &value, &bytes) !=
-                    ERROR_SUCCESS) {
+std::optional<DWORD> ProductDword(const wchar_t* name) {
+    RegistryKey key = OpenKeyForReading(HKEY_LOCAL_MACHINE, kProductKeyPath);
+    DWORD value = 0, size = sizeof(value), type = REG_NONE;
+    if (!key || !QueryData(key.Get(), name, reinterpret_cast<BYTE*>(&value), size, &type) ||
+        type != REG_DWORD) {
         return std::nullopt;
     }
     return value;
@@ -84,7 +64,8 @@ class Installer : public LauncherTest {
     void ExpectNothingInstalled() {
         EXPECT_FALSE(KeyExists(kProductKeyPath));
         EXPECT_FALSE(KeyExists(kUninstallKeyPath));
-        EXPECT_FALSE(Exists(MakerFolder())) << "a folder was left in Program Files";
+        EXPECT_EQ(GetFileAttributesW(MakerFolder().c_str()), INVALID_FILE_ATTRIBUTES)
+            << "a folder was left in Program Files";
     }
 };
 
@@ -92,7 +73,7 @@ class Installer : public LauncherTest {
 TEST_F(Installer, SilentInstallLeavesWhatTheLauncherReadsAndUninstallTakesItAway) {
     struct Row {
         const wchar_t* arguments;
-        int edition;  // 0: the disc has no ORVAK.INI
+        DWORD edition;  // 0: the disc has no ORVAK.INI
         const wchar_t* language;
         const wchar_t* otherLanguage;
         bool silentByEnvironment;  // as when the launcher starts it
@@ -107,29 +88,22 @@ TEST_F(Installer, SilentInstallLeavesWhatTheLauncherReadsAndUninstallTakesItAway
     MenuController& menu = ::launcher.menu;
     for (const Row& row : rows) {
         SCOPED_TRACE(testing::Message() << "setup.exe " << row.arguments);
-        if (row.edition == 0) {
-            disc.Remove(L"ORVAK.INI");
-        } else {
-            disc.SetEdition(row.edition);
-        }
+        row.edition ? disc.SetEdition(static_cast<int>(row.edition)) : disc.Remove(L"ORVAK.INI");
         SetEnvironmentVariableW(L"VEMO_SETUP_SILENT", row.silentByEnvironment ? L"1" : nullptr);
         ASSERT_EQ(RunSetup(row.arguments), std::optional<DWORD>(0));
 
-        EXPECT_EQ(MachineText(kProductKeyPath, L"Version"), std::optional<std::wstring>(L"1.0"));
-        EXPECT_EQ(DwordValue(kProductKeyPath, L"EP8Installed"), std::optional<DWORD>(1));
-        EXPECT_EQ(MachineText(kProductKeyPath, L"VEMO_DATA"),
-                  std::optional<std::wstring>(GameFolder()));
-        EXPECT_EQ(MachineText(kProductKeyPath, L"VEMO_LANGUAGE"),
-                  std::optional<std::wstring>(row.language));
-        EXPECT_EQ(
-            MachineText(kProductKeyPath, L"VEMO_OTHERLANGUAGE"),
-            row.otherLanguage ? std::optional<std::wstring>(row.otherLanguage) : std::nullopt);
-        EXPECT_EQ(DwordValue(kProductKeyPath, L"VEMO_SKU"),
-                  std::optional<DWORD>(static_cast<DWORD>(row.edition)));
-        EXPECT_EQ(MachineText(kUninstallKeyPath, L"DisplayName"),
-                  std::optional<std::wstring>(L"The Vemo Vodizuri Virezazida"));
-        EXPECT_EQ(MachineText(kUninstallKeyPath, L"UninstallString"),
-                  std::optional<std::wstring>(L"\"" + SetupProgram() + L"\" -u"));
+        auto text = [](const wchar_t* key, const wchar_t* name) {
+            return MachineText(key, name).value_or(L"(missing)");
+        };
+        EXPECT_EQ(text(kProductKeyPath, L"Version"), L"1.0");
+        EXPECT_EQ(ProductDword(L"EP8Installed"), std::optional<DWORD>(1));
+        EXPECT_EQ(text(kProductKeyPath, L"VEMO_DATA"), GameFolder());
+        EXPECT_EQ(text(kProductKeyPath, L"VEMO_LANGUAGE"), row.language);
+        EXPECT_EQ(text(kProductKeyPath, L"VEMO_OTHERLANGUAGE"),
+                  row.otherLanguage ? row.otherLanguage : L"(missing)");
+        EXPECT_EQ(ProductDword(L"VEMO_SKU"), std::optional<DWORD>(row.edition));
+        EXPECT_EQ(text(kUninstallKeyPath, L"DisplayName"), L"The Vemo Vodizuri Virezazida");
+        EXPECT_EQ(text(kUninstallKeyPath, L"UninstallString"), L"\"" + SetupProgram() + L"\" -u");
 
         // The disc's own programs, where the launcher's Play commands look for them.
         EXPECT_EQ(FileSize(GameFolder() + L"\\Vemo.exe"),
@@ -148,11 +122,6 @@ TEST_F(Installer, SilentInstallLeavesWhatTheLauncherReadsAndUninstallTakesItAway
     ExpectNothingInstalled();
     menu.CheckInstallation();
     EXPECT_FALSE(menu.installed);
-
-    auto lines = log.Lines();
-    ASSERT_EQ(lines.size(), 5u) << "each run logs one line";
-    EXPECT_EQ(lines[1],
-              (std::vector<std::wstring>{L"setup.exe", L"-s -l0014", disc.Path(L"Setup")}));
 }
 
 TEST_F(Installer, AskingFirstNamesTheLanguageInstallsOnOkAndTellsWhereAndNothingOnCancel) {
@@ -189,6 +158,82 @@ TEST_F(Installer, ADiscWithoutTheCreatorToolOrAnUnreadableCommandLineInstallsNot
     disc.Remove(L"Setup\\Program\\TheVemoCreator.exe");
     EXPECT_EQ(RunSetup(L"-l0407 -s"), std::optional<DWORD>(kInstallFailed));
     ExpectNothingInstalled();
+}
+
+const wchar_t kNotOnDiscText[] =
+    L"Autoplay will only run from The Vemo installation CD.  Exiting now.";
+const wchar_t kInsertDiscText[] =
+    L"To continue with this operation, please insert Disc 1 into the CD-ROM drive and click OK.";
+
+class LauncherStartup : public LauncherTest {
+  protected:
+    // Starts the launcher where none of its backgrounds are, which tells it that it is not on
+    // its disc, and answers the notice it shows.
+    void StartOffTheDiscAndAnswerTheNotice() {
+        disc.Remove(L"Launcher");
+        ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
+        AnswerMessageBox(launcher.Id(), L"", kNotOnDiscText, {IDOK}, IDOK);
+    }
+
+    // An installer the launcher started may log its start after the launcher has gone.
+    bool NothingStarted() const {
+        return !WaitUntil([&] { return !log.Lines().empty(); }, 3000);
+    }
+};
+
+TEST_F(LauncherStartup, OffTheDiscItSaysSoThenAsksForDiscOneUntilCancelled) {
+    disc.Remove(L"Setup\\data2.cab");
+    ASSERT_NO_FATAL_FAILURE(StartOffTheDiscAndAnswerTheNotice());
+    // OK with the disc still missing asks again; Cancel gives up and the launcher ends.
+    AnswerMessageBox(launcher.Id(), L"Insert Disc 1", kInsertDiscText, {IDOK, IDCANCEL}, IDOK);
+    AnswerMessageBox(launcher.Id(), L"Insert Disc 1", kInsertDiscText, {IDOK, IDCANCEL}, IDCANCEL);
+    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+    EXPECT_TRUE(NothingStarted()) << "nothing may be installed without the disc";
+}
+
+TEST_F(LauncherStartup, OffTheDiscWithTheSetupFilesItStartsTheInstallerInUsEnglish) {
+    ASSERT_NO_FATAL_FAILURE(StartOffTheDiscAndAnswerTheNotice());
+    log.ExpectNext(L"setup.exe", L"-l0009", disc.Path(L"Setup"));
+    // The installer asks before it installs; the user declines.
+    auto question = WaitForMessageBoxTitled(kSetupCaption);
+    ASSERT_TRUE(question) << "the installer did not ask";
+    EXPECT_NE(question->text.find(L"English"), std::wstring::npos);
+    ASSERT_TRUE(PressButton(*question, IDCANCEL));
+    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+}
+
+TEST_F(LauncherStartup, SecondLauncherEndsAtOnceWhileTheFirstSaysItIsOffTheDisc) {
+    disc.Remove(L"Launcher");
+    ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
+    std::optional<MessageBoxSeen> notice = WaitForMessageBox(launcher.Id());
+    ASSERT_TRUE(notice);
+
+    TestProcess second;
+    ASSERT_TRUE(second.Start(disc.Launcher(), L"", disc.Root()));
+    EXPECT_EQ(second.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+    EXPECT_TRUE(TopLevelWindows(second.Id()).empty());
+    // The first one is still there, waiting for its user.
+    EXPECT_FALSE(launcher.WaitForExit(0).has_value());
+    EXPECT_TRUE(IsWindowVisible(notice->window));
+    // With the product installed, nothing more is asked or started after the notice.
+    ScopedMachineKey uninstall(kUninstallKeyPath);
+    ASSERT_TRUE(PressButton(*notice, IDOK));
+    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+    EXPECT_TRUE(NothingStarted()) << "the installer was started";
+}
+
+TEST_F(LauncherStartup, SecondLauncherBringsTheFirstBackRestoredAndInFront) {
+    ASSERT_TRUE(Start(L"-l040c"));
+    ShowWindow(window, SW_MINIMIZE);
+    ASSERT_TRUE(WaitUntil([&] { return IsIconic(window) != FALSE; }, 5000));
+
+    TestProcess second;
+    ASSERT_TRUE(second.Start(disc.Launcher(), L"", disc.Root()));
+    EXPECT_EQ(second.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+    EXPECT_TRUE(TopLevelWindows(second.Id()).empty());
+    EXPECT_TRUE(
+        WaitUntil([&] { return !IsIconic(window) && GetForegroundWindow() == window; }, 5000))
+        << "the first launcher stayed minimised or behind";
 }
 
 }  // namespace

@@ -6,28 +6,23 @@
 #include <vector>
 
 #include "launcher_driver_win.h"
-#include "shell_associations_win.h"
 
 namespace {
 
-// The user returns to the launcher (after a program it started took the front).
-void ComeBack(HWND window) {
-    SetForegroundWindow(window);
-    WaitUntil([&] { return GetForegroundWindow() == window; });
-}
-
 class Keyboard : public LauncherTest {
   protected:
-    void SetUp() override {
-        LauncherTest::SetUp();
-        shell.OpenEverythingWithViewer();
-    }
-
     // From here on only keys are used.
     bool StartWithKeys() {
+        shell.OpenEverythingWithViewer();
         if (!Start(L"-l0409")) return false;
-        ComeBack(window);
+        ComeBack();
         return true;
+    }
+
+    // The user returns to the launcher after a program it started took the front.
+    void ComeBack() const {
+        SetForegroundWindow(window);
+        WaitUntil([&] { return GetForegroundWindow() == window; });
     }
 
     int FocusedId() const {
@@ -35,16 +30,18 @@ class Keyboard : public LauncherTest {
         return focus && GetParent(focus) == window ? GetDlgCtrlID(focus) : 0;
     }
 
-    // Presses Tab until the button with this id has the focus (at most a round of stops).
-    bool TabTo(int id) const {
+    // Tabs to the button (at most a round of stops) and presses it with `key`.
+    bool PressWithKey(int id, WORD key = VK_RETURN) const {
         for (int i = 0; i < 12 && FocusedId() != id; ++i) PressKey(VK_TAB);
-        return FocusedId() == id;
+        if (FocusedId() != id) return false;
+        PressKey(key);
+        return true;
     }
 
     // A program the launcher started shows its window; the user closes it and comes back.
     bool CloseProgramWindow(const wchar_t* className) const {
         const bool closed = CloseWindowOf(className);
-        ComeBack(window);
+        ComeBack();
         return closed;
     }
 
@@ -54,23 +51,18 @@ class Keyboard : public LauncherTest {
 TEST_F(Keyboard, TabAndTheArrowsWalkTheButtonsInReadingOrderWithTheirHoverFace) {
     ASSERT_TRUE(StartWithKeys());
     EXPECT_EQ(FocusedId(), 0) << "no button has the focus before a key is pressed";
-    const std::vector<int> order = {101, 107, 103, 108, 1000, 110};
-    for (int id : order) {
-        PressKey(VK_TAB);
-        EXPECT_EQ(FocusedId(), id);
+    // Tab goes round, Shift+Tab back, the arrows step as Tab and Shift+Tab do.
+    const struct {
+        WORD key;
+        WORD modifier;
+        int focused;
+    } steps[] = {{VK_TAB, 0, 101},  {VK_TAB, 0, 107},  {VK_TAB, 0, 103},   {VK_TAB, 0, 108},
+                 {VK_TAB, 0, 1000}, {VK_TAB, 0, 110},  {VK_TAB, 0, 101},   {VK_TAB, VK_SHIFT, 110},
+                 {VK_UP, 0, 1000},  {VK_LEFT, 0, 108}, {VK_DOWN, 0, 1000}, {VK_RIGHT, 0, 110}};
+    for (const auto& step : steps) {
+        PressKey(step.key, step.modifier);
+        EXPECT_EQ(FocusedId(), step.focused) << "after key " << step.key << " to " << step.focused;
     }
-    PressKey(VK_TAB);
-    EXPECT_EQ(FocusedId(), 101) << "Tab goes round";
-    PressKey(VK_TAB, VK_SHIFT);
-    EXPECT_EQ(FocusedId(), 110) << "Shift+Tab goes back";
-    PressKey(VK_UP);
-    EXPECT_EQ(FocusedId(), 1000);
-    PressKey(VK_LEFT);
-    EXPECT_EQ(FocusedId(), 108);
-    PressKey(VK_DOWN);
-    EXPECT_EQ(FocusedId(), 1000);
-    PressKey(VK_RIGHT);
-    EXPECT_EQ(FocusedId(), 110);
 
     // The focused button wears the hover face, and loses it with the focus.
     const RECT exitFace{405, 411, 459, 465};
@@ -89,22 +81,19 @@ TEST_F(Keyboard, EveryButtonOfTheMainPageAndOfAPanelCanBePressed) {
     ASSERT_TRUE(StartWithKeys());
 
     // Install: the disc's installer asks first; the user declines.
-    ASSERT_TRUE(TabTo(101));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(101));
     log.ExpectNext(L"setup.exe", L"-l0009", disc.Path(L"Setup"));
     auto question = WaitForMessageBoxTitled(L"The Vemo Vodizuri Virezazida Setup");
     ASSERT_TRUE(question) << "Enter did not start the installer";
     ASSERT_TRUE(PressButton(*question, IDCANCEL));
-    ComeBack(window);
+    ComeBack();
 
-    ASSERT_TRUE(TabTo(107));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(107));
     log.ExpectNext(L"viewer.exe", L"\"http://www.vemo.example\"", disc.Root());
-    ComeBack(window);
+    ComeBack();
 
     // More Games opens its panel; Escape closes it and leaves the focus on its button.
-    ASSERT_TRUE(TabTo(103));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(103));
     EXPECT_TRUE(WaitUntil([&] { return VisibleButton(window, 601) != nullptr; }));
     EXPECT_EQ(FocusedId(), 103);
     PressKey(VK_ESCAPE);
@@ -112,35 +101,29 @@ TEST_F(Keyboard, EveryButtonOfTheMainPageAndOfAPanelCanBePressed) {
     EXPECT_EQ(FocusedId(), 103);
 
     // More Information opens its panel; Tab reaches its plates after the main page.
-    ASSERT_TRUE(TabTo(108));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(108));
     ASSERT_TRUE(WaitUntil([&] { return VisibleButton(window, 303) != nullptr; }));
-    ASSERT_TRUE(TabTo(303));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(303));
     log.ExpectNext(L"Kelpa.exe", L"", disc.Path(L"Support"));
     EXPECT_TRUE(CloseProgramWindow(L"KelpaWindow"));
-    ASSERT_TRUE(TabTo(302));
-    PressKey(VK_SPACE);
+    ASSERT_TRUE(PressWithKey(302, VK_SPACE));
     log.ExpectNext(L"Trivex.exe", L"", disc.Path(L"Support"));
     EXPECT_TRUE(CloseProgramWindow(L"TrivexWindow"));
-    ASSERT_TRUE(TabTo(301));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(301));
     EXPECT_TRUE(CloseProgramWindow(L"Notepad")) << "Enter did not open the readme";
     PressKey(VK_ESCAPE);
     EXPECT_TRUE(WaitUntil([&] { return VisibleButton(window, 303) == nullptr; }));
 
     // About: the box opens and Enter closes it.
-    ASSERT_TRUE(TabTo(1000));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(1000));
     auto about = WaitForMessageBox(launcher.Id());
     ASSERT_TRUE(about) << "Enter did not open the About box";
     PressKey(VK_RETURN);
     EXPECT_TRUE(WaitUntil([&] { return !IsWindow(about->window); }));
-    ComeBack(window);
+    ComeBack();
 
     // Exit ends the launcher.
-    ASSERT_TRUE(TabTo(110));
-    PressKey(VK_RETURN);
+    ASSERT_TRUE(PressWithKey(110));
     EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
 }
 

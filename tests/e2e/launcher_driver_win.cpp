@@ -9,6 +9,7 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <sstream>
 
 #include "locale/config_win.h"
 
@@ -47,26 +48,17 @@ std::wstring ClassNameOf(HWND window) {
 Screenshot::Screenshot(HWND window) {
     RECT client{};
     GetClientRect(window, &client);
-    width_ = client.right;
-    height_ = client.bottom;
     POINT origin{0, 0};
     ClientToScreen(window, &origin);
-    BITMAPINFO info = TopDownInfo(width_, height_);
-    HDC screen = GetDC(nullptr);
-    HDC memory = CreateCompatibleDC(screen);
-    void* bits = nullptr;
-    HBITMAP bitmap = CreateDIBSection(memory, &info, DIB_RGB_COLORS, &bits, nullptr, 0);
-    HGDIOBJ previous = SelectObject(memory, bitmap);
-    BitBlt(memory, 0, 0, width_, height_, screen, origin.x, origin.y, SRCCOPY);
-    GdiFlush();
-    if (bits) {
-        pixels_.assign(static_cast<const std::uint32_t*>(bits),
-                       static_cast<const std::uint32_t*>(bits) + width_ * height_);
+    WindowDc screen(nullptr);
+    MemoryDc memory(CreateCompatibleDC(screen.Get()));
+    UniqueGdi<HBITMAP> copy(CreateCompatibleBitmap(screen.Get(), client.right, client.bottom));
+    {
+        SelectionGuard selected(memory.Get(), copy.Get());
+        BitBlt(memory.Get(), 0, 0, client.right, client.bottom, screen.Get(), origin.x, origin.y,
+               SRCCOPY);
     }
-    SelectObject(memory, previous);
-    DeleteObject(bitmap);
-    DeleteDC(memory);
-    ReleaseDC(nullptr, screen);
+    *this = Screenshot(copy.Get());
 }
 
 Screenshot::Screenshot(HBITMAP picture) {
@@ -76,10 +68,9 @@ Screenshot::Screenshot(HBITMAP picture) {
     height_ = info.bmHeight;
     BITMAPINFO layout = TopDownInfo(width_, height_);
     pixels_.resize(static_cast<std::size_t>(width_ * height_));
-    HDC screen = GetDC(nullptr);
-    GetDIBits(screen, picture, 0, static_cast<UINT>(height_), pixels_.data(), &layout,
+    WindowDc screen(nullptr);
+    GetDIBits(screen.Get(), picture, 0, static_cast<UINT>(height_), pixels_.data(), &layout,
               DIB_RGB_COLORS);
-    ReleaseDC(nullptr, screen);
 }
 
 Rgb Screenshot::At(int x, int y) const {
@@ -89,34 +80,28 @@ Rgb Screenshot::At(int x, int y) const {
             static_cast<std::uint8_t>(p)};
 }
 
-int Screenshot::DifferingPixels(const Screenshot& other, const RECT& area) const {
+int Screenshot::DifferingPixels(const Screenshot& other, const RECT& area, int tolerance) const {
     int count = 0;
     for (int y = area.top; y < area.bottom; ++y) {
         for (int x = area.left; x < area.right; ++x) {
-            if (At(x, y) != other.At(x, y)) ++count;
+            if (ColorDistance(At(x, y), other.At(x, y)) > tolerance) ++count;
         }
     }
     return count;
 }
 
 void Screenshot::SaveForReadme(const std::wstring& name) const {
-    wchar_t folder[MAX_PATH];
-    DWORD length = GetEnvironmentVariableW(L"AUTOPLAY_SCREENSHOT_DIR", folder, MAX_PATH);
-    if (length == 0 || length >= MAX_PATH) return;
-    BITMAPINFO info = TopDownInfo(width_, height_);
-    BITMAPFILEHEADER file{};
-    file.bfType = 0x4D42;
-    file.bfOffBits = sizeof(file) + sizeof(info.bmiHeader);
-    file.bfSize = file.bfOffBits + static_cast<DWORD>(pixels_.size() * 4);
-    const std::wstring path = std::wstring(folder) + L"\\" + name + L".bmp";
-    HANDLE out = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
-                             FILE_ATTRIBUTE_NORMAL, nullptr);
-    if (out == INVALID_HANDLE_VALUE) return;
-    DWORD written = 0;
-    WriteFile(out, &file, sizeof(file), &written, nullptr);
-    WriteFile(out, &info.bmiHeader, sizeof(info.bmiHeader), &written, nullptr);
-    WriteFile(out, pixels_.data(), static_cast<DWORD>(pixels_.size() * 4), &written, nullptr);
-    CloseHandle(out);
+    const wchar_t* folder = _wgetenv(L"AUTOPLAY_SCREENSHOT_DIR");
+    if (!folder) return;
+    const BITMAPINFO info = TopDownInfo(width_, height_);
+    const DWORD headers = sizeof(BITMAPFILEHEADER) + sizeof(info.bmiHeader);
+    const DWORD pixelBytes = static_cast<DWORD>(pixels_.size() * 4);
+    const BITMAPFILEHEADER file{0x4D42, headers + pixelBytes, 0, 0, headers};
+    std::ofstream out(std::filesystem::path(std::wstring(folder) + L"\\" + name + L".bmp"),
+                      std::ios::binary);
+    out.write(reinterpret_cast<const char*>(&file), sizeof(file));
+    out.write(reinterpret_cast<const char*>(&info.bmiHeader), sizeof(info.bmiHeader));
+    out.write(reinterpret_cast<const char*>(pixels_.data()), pixelBytes);
 }
 
 int ColorDistance(Rgb a, Rgb b) {
@@ -138,7 +123,9 @@ Screenshot SettledShot(HWND window, DWORD timeoutMs) {
 
 namespace {
 
-void SendMouse(DWORD flags, POINT screen) {
+void SendMouse(HWND window, POINT client, DWORD flags) {
+    POINT screen = client;
+    ClientToScreen(window, &screen);
     INPUT input{};
     input.type = INPUT_MOUSE;
     // Absolute coordinates run from 0 to 65535 over the primary screen.
@@ -155,11 +142,7 @@ void SendMouse(DWORD flags, POINT screen) {
 std::vector<ButtonSeen> ChildButtons(HWND launcher) {
     std::vector<ButtonSeen> found;
     for (HWND child = nullptr; (child = FindWindowExW(launcher, child, nullptr, nullptr));) {
-        ButtonSeen seen{child,
-                        ClassNameOf(child),
-                        TextOfWindow(child),
-                        GetDlgCtrlID(child),
-                        {},
+        ButtonSeen seen{child, ClassNameOf(child), TextOfWindow(child), GetDlgCtrlID(child),
                         IsWindowVisible(child) != FALSE};
         GetWindowRect(child, &seen.place);
         MapWindowPoints(nullptr, launcher, reinterpret_cast<POINT*>(&seen.place), 2);
@@ -176,19 +159,15 @@ HWND VisibleButton(HWND launcher, int id) {
 }
 
 void MoveMouse(HWND window, POINT client) {
-    POINT screen = client;
-    ClientToScreen(window, &screen);
-    SendMouse(MOUSEEVENTF_MOVE, screen);
+    SendMouse(window, client, MOUSEEVENTF_MOVE);
     Sleep(100);
 }
 
 void Click(HWND window, POINT client) {
     MoveMouse(window, client);
-    POINT screen = client;
-    ClientToScreen(window, &screen);
-    SendMouse(MOUSEEVENTF_LEFTDOWN, screen);
+    SendMouse(window, client, MOUSEEVENTF_LEFTDOWN);
     Sleep(50);
-    SendMouse(MOUSEEVENTF_LEFTUP, screen);
+    SendMouse(window, client, MOUSEEVENTF_LEFTUP);
     Sleep(100);
 }
 
@@ -270,10 +249,8 @@ std::optional<DWORD> TestProcess::WaitForExit(DWORD timeoutMs) {
 double ProcessorMs(DWORD processId) {
     HANDLE snapshot = CreateToolhelp32Snapshot(TH32CS_SNAPTHREAD, 0);
     if (snapshot == INVALID_HANDLE_VALUE) return 0;
-    auto ms = [](const FILETIME& t) {
-        return static_cast<double>(static_cast<ULONGLONG>(t.dwHighDateTime) << 32 |
-                                   t.dwLowDateTime) /
-               10000.0;
+    auto ms = [](FILETIME t) {
+        return (static_cast<ULONGLONG>(t.dwHighDateTime) << 32 | t.dwLowDateTime) / 10000.0;
     };
     double total = 0;
     THREADENTRY32 entry{};
@@ -290,6 +267,17 @@ double ProcessorMs(DWORD processId) {
     }
     CloseHandle(snapshot);
     return total;
+}
+
+void ExpectIdle(DWORD processId, const char* what) {
+    const double before = ProcessorMs(processId);
+    const DWORD start = GetTickCount();
+    Sleep(5000);
+    const double used = ProcessorMs(processId) - before;
+    const DWORD elapsed = GetTickCount() - start;
+    std::printf("processor time %s: %.1f ms in %lu ms\n", what, used,
+                static_cast<unsigned long>(elapsed));
+    EXPECT_LT(used, elapsed * 0.01) << "over 1 % of one core while nothing happens";
 }
 
 namespace {
@@ -343,17 +331,12 @@ std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs
     return ReadMessageBox(window);
 }
 
-std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption,
-                                                      DWORD timeoutMs) {
+std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption) {
     HWND window = nullptr;
-    if (!WaitUntil(
-            [&] {
-                window = FindWindowW(L"#32770", caption.c_str());
-                return window && IsWindowVisible(window);
-            },
-            timeoutMs)) {
-        return std::nullopt;
-    }
+    auto shown = [&] {
+        return (window = FindWindowW(L"#32770", caption.c_str())) && IsWindowVisible(window);
+    };
+    if (!WaitUntil(shown, kWindowWaitMs)) return std::nullopt;
     return ReadMessageBox(window);
 }
 
@@ -375,26 +358,11 @@ void AnswerMessageBox(DWORD processId, const std::wstring& caption, const std::w
     EXPECT_TRUE(PressButton(*box, answer));
 }
 
-SampleDisc::SampleDisc() {
-    wchar_t base[MAX_PATH];
-    GetTempPathW(MAX_PATH, base);
-    static unsigned counter = 0;
-    root_ = std::wstring(base) + L"Vemo disc-" + std::to_wstring(GetCurrentProcessId()) + L"-" +
-            std::to_wstring(++counter) + L"\\";
-    RemoveTree(root_);
+SampleDisc::SampleDisc() : root_(folder_.Path() + L"Vemo disc\\") {
     std::error_code error;
     std::filesystem::copy(TestProgramFolder() + L"..\\disc", root_,
                           std::filesystem::copy_options::recursive, error);
     EXPECT_FALSE(error) << "the built sample disc could not be copied: " << error.message();
-}
-
-SampleDisc::~SampleDisc() {
-    WaitUntil(
-        [&] {
-            RemoveTree(root_);
-            return GetFileAttributesW(root_.c_str()) == INVALID_FILE_ATTRIBUTES;
-        },
-        5000);
 }
 
 void SampleDisc::SetEdition(int sku) const {
@@ -416,40 +384,34 @@ void SampleDisc::PutBack(const std::wstring& relativePath) const {
     ASSERT_TRUE(MoveFileW(Path(relativePath + L".away").c_str(), Path(relativePath).c_str()));
 }
 
-CompanionLog::CompanionLog() {
-    wchar_t base[MAX_PATH];
-    GetTempPathW(MAX_PATH, base);
-    path_ = std::wstring(base) + L"autoplay-companions-" + std::to_wstring(GetCurrentProcessId()) +
-            L".log";
-    DeleteFileW(path_.c_str());
+std::wstring InstalledFolder(const std::wstring& name) {
+    const std::wstring maker = _wgetenv(L"ProgramFiles") + std::wstring(L"\\Orvak");
+    return name.empty() ? maker : maker + L"\\" + name;
+}
+
+CompanionLog::CompanionLog() : path_(folder_.Path() + L"companions.log") {
     SetEnvironmentVariableW(L"VEMO_COMPANION_LOG", path_.c_str());
 }
 
 CompanionLog::~CompanionLog() {
     SetEnvironmentVariableW(L"VEMO_COMPANION_LOG", nullptr);
-    DeleteFileW(path_.c_str());
 }
 
 std::vector<LogLine> CompanionLog::Lines() const {
-    std::vector<LogLine> lines;
     std::ifstream file(std::filesystem::path(path_), std::ios::binary);
     const std::string bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
     std::wstring text(bytes.size(), L'\0');
     text.resize(static_cast<std::size_t>(
         MultiByteToWideChar(CP_UTF8, 0, bytes.data(), static_cast<int>(bytes.size()), text.data(),
                             static_cast<int>(text.size()))));
-    std::size_t start = 0;
-    for (std::size_t end = text.find(L"\r\n"); end != std::wstring::npos;
-         start = end + 2, end = text.find(L"\r\n", start)) {
-        const std::wstring line = text.substr(start, end - start);
-        LogLine fields;
-        std::size_t fieldStart = 0;
-        for (std::size_t tab = line.find(L'\t'); tab != std::wstring::npos;
-             fieldStart = tab + 1, tab = line.find(L'\t', fieldStart)) {
-            fields.push_back(line.substr(fieldStart, tab - fieldStart));
-        }
-        fields.push_back(line.substr(fieldStart));
-        lines.push_back(fields);
+    std::vector<LogLine> lines;
+    std::wistringstream rows(text);
+    for (std::wstring row; std::getline(rows, row, L'\n');) {
+        if (row.empty() || row.back() != L'\r') break;  // a line still being written
+        row.pop_back();
+        LogLine& fields = lines.emplace_back();
+        std::wistringstream parts(row + L'\t');
+        for (std::wstring field; std::getline(parts, field, L'\t');) fields.push_back(field);
     }
     return lines;
 }
@@ -562,4 +524,97 @@ std::optional<DWORD> LauncherTest::RunSetup(const std::wstring& arguments) {
     }
     gameInstalled_ = arguments.find(L"-u") == std::wstring::npos;
     return setup.WaitForExit(3 * kWindowWaitMs);
+}
+
+namespace {
+
+// HKEY_CLASSES_ROOT merges the machine's and the user's classes: both are set aside.
+const HKEY kHives[] = {HKEY_LOCAL_MACHINE, HKEY_CURRENT_USER};
+const wchar_t kClasses[] = L"Software\\Classes\\";
+const wchar_t kTestKeys[] = L"Software\\AutoPlay tests";
+const wchar_t* const kNames[] = {
+    L"http", L"https", L".htm", L".mpg", L"AutoPlayTests.htm", L"AutoPlayTests.mpg"};
+
+void DeleteKey(HKEY hive, const std::wstring& path) {
+    if (RegDeleteTreeW(hive, path.c_str()) == ERROR_SUCCESS) RegDeleteKeyW(hive, path.c_str());
+}
+
+// Moves a key with everything below it over whatever `to` held; nothing when `from` is absent.
+void MoveKey(HKEY hive, const std::wstring& from, const std::wstring& to) {
+    DeleteKey(hive, to);
+    HKEY source = nullptr, target = nullptr;
+    if (RegOpenKeyExW(hive, from.c_str(), 0, KEY_READ, &source) != ERROR_SUCCESS) return;
+    RegCreateKeyExW(hive, to.c_str(), 0, nullptr, 0, KEY_ALL_ACCESS, nullptr, &target, nullptr);
+    const bool copied = target && RegCopyTreeW(source, nullptr, target) == ERROR_SUCCESS;
+    RegCloseKey(source);
+    if (target) RegCloseKey(target);
+    ASSERT_TRUE(copied) << "could not copy " << from;
+    DeleteKey(hive, from);
+    EXPECT_NE(RegOpenKeyExW(hive, from.c_str(), 0, KEY_READ, &source), ERROR_SUCCESS)
+        << "could not move " << from;
+}
+
+void SetText(const std::wstring& keyPath, const wchar_t* name, const std::wstring& text) {
+    const std::wstring path = kClasses + keyPath;
+    ASSERT_EQ(RegSetKeyValueW(HKEY_LOCAL_MACHINE, path.c_str(), name, REG_SZ, text.c_str(),
+                              static_cast<DWORD>((text.size() + 1) * sizeof(wchar_t))),
+              ERROR_SUCCESS);
+}
+
+std::wstring OpenCommand(const std::wstring& program) {
+    return L"\"" + program + L"\" \"%1\"";
+}
+
+}  // namespace
+
+ShellAssociations::ShellAssociations() {
+    for (HKEY hive : kHives) {
+        for (const wchar_t* name : kNames) {
+            MoveKey(hive, kClasses + std::wstring(name), kTestKeys + (L"\\" + std::wstring(name)));
+        }
+    }
+}
+
+ShellAssociations::~ShellAssociations() {
+    for (HKEY hive : kHives) {
+        for (const wchar_t* name : kNames) {
+            MoveKey(hive, kTestKeys + (L"\\" + std::wstring(name)), kClasses + std::wstring(name));
+        }
+        DeleteKey(hive, kTestKeys);
+    }
+}
+
+void ShellAssociations::OpenWebAddressesWith(const std::wstring& program) const {
+    for (const wchar_t* protocol : {L"http", L"https"}) {
+        SetText(protocol, nullptr, L"URL:" + std::wstring(protocol));
+        SetText(protocol, L"URL Protocol", L"");
+        SetText(std::wstring(protocol) + L"\\shell\\open\\command", nullptr, OpenCommand(program));
+    }
+}
+
+void ShellAssociations::OpenFilesWith(const wchar_t* extension, const std::wstring& program) const {
+    const std::wstring kind = L"AutoPlayTests" + std::wstring(extension);
+    SetText(extension, nullptr, kind);
+    SetText(kind + L"\\shell\\open\\command", nullptr, OpenCommand(program));
+}
+
+void ShellAssociations::OpenEverythingWithViewer() const {
+    OpenWebAddressesWith(ViewerProgram());
+    OpenFilesWith(L".htm", ViewerProgram());
+    OpenFilesWith(L".mpg", ViewerProgram());
+}
+
+void ShellAssociations::ForgetWebAddresses() const {
+    for (const wchar_t* protocol : {L"http", L"https"}) {
+        DeleteKey(HKEY_LOCAL_MACHINE, kClasses + std::wstring(protocol));
+    }
+}
+
+void ShellAssociations::ForgetFiles(const wchar_t* extension) const {
+    DeleteKey(HKEY_LOCAL_MACHINE, kClasses + std::wstring(extension));
+    DeleteKey(HKEY_LOCAL_MACHINE, kClasses + (L"AutoPlayTests" + std::wstring(extension)));
+}
+
+std::wstring ViewerProgram() {
+    return TestProgramFolder() + L"viewer.exe";
 }

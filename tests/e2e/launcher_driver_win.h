@@ -1,7 +1,6 @@
-// Driving the real AutoPlay.exe as a user would: start it on a copy of the sample disc, find
-// its windows, buttons and message boxes and answer them, move and click the real mouse, press
-// real keys, read the client area back as pixels, and read what the started programs logged.
-// Every wait is bounded.
+// Driving the real AutoPlay.exe as a user would, on a copy of the sample disc: its windows and
+// message boxes, the real mouse and keys, its client area read back as pixels, and the log the
+// started programs write. Every wait is bounded.
 #ifndef AUTOPLAY_TESTS_LAUNCHER_DRIVER_WIN_H
 #define AUTOPLAY_TESTS_LAUNCHER_DRIVER_WIN_H
 
@@ -25,8 +24,7 @@ bool WaitUntil(const std::function<bool()>& done, DWORD timeoutMs = 10000);
 bool SameTextIgnoringCase(const std::wstring& a, const std::wstring& b);
 std::wstring TextOfWindow(HWND window);
 
-// The client area of a window as it is on the screen (or the pixels of a picture), read as
-// top-down 32-bit pixels.
+// A window's client area as the screen shows it, or a picture, as 32-bit pixels.
 class Screenshot {
   public:
     explicit Screenshot(HWND window);
@@ -35,10 +33,9 @@ class Screenshot {
     int Width() const { return width_; }
     int Height() const { return height_; }
     Rgb At(int x, int y) const;
-    // Pixels that differ between two shots of the same size, inside a rectangle.
-    int DifferingPixels(const Screenshot& other, const RECT& area) const;
-    // Saves the shot as NAME.bmp in AUTOPLAY_SCREENSHOT_DIR when that is set (the README's
-    // pictures are made this way, scripts/screenshots.sh); nothing otherwise.
+    // Pixels inside `area` farther than `tolerance` (ColorDistance) from the other shot's.
+    int DifferingPixels(const Screenshot& other, const RECT& area, int tolerance = 0) const;
+    // As NAME.bmp in AUTOPLAY_SCREENSHOT_DIR when that is set (scripts/screenshots.sh).
     void SaveForReadme(const std::wstring& name) const;
 
   private:
@@ -48,7 +45,7 @@ class Screenshot {
 };
 
 int ColorDistance(Rgb a, Rgb b);
-// Waits until two shots of the window in a row are equal (its painting has settled); the last.
+// The window once two shots in a row are equal (its painting has settled), or the last.
 Screenshot SettledShot(HWND window, DWORD timeoutMs = 5000);
 
 // A child window of the launcher as a user and a screen reader see it.
@@ -57,19 +54,17 @@ struct ButtonSeen {
     std::wstring className;
     std::wstring text;
     int id = 0;
-    RECT place{};  // in the launcher's client area
     bool visible = false;
+    RECT place{};  // in the launcher's client area
 };
 std::vector<ButtonSeen> ChildButtons(HWND launcher);
-// The visible child with this control id, or null.
 HWND VisibleButton(HWND launcher, int id);
 
-// The real mouse, moved or clicked at a point of a window's client area.
+// The real mouse and keyboard, at a point of a window's client area.
 void MoveMouse(HWND window, POINT client);
 void Click(HWND window, POINT client);
-// A real key press, as the keyboard sends it, with a key held down (VK_SHIFT, VK_MENU) or not.
 void PressKey(WORD virtualKey, WORD modifier = 0);
-// The window that has the keyboard focus in the thread that owns `window`.
+// The window with the keyboard focus in the thread that owns `window`.
 HWND FocusInThreadOf(HWND window);
 
 // A program started for a test; killed when the test ends if still running.
@@ -80,10 +75,9 @@ class TestProcess {
     TestProcess(const TestProcess&) = delete;
     TestProcess& operator=(const TestProcess&) = delete;
 
-    // Starts `program` with `arguments` (may be empty) in `folder`.
     bool Start(const std::wstring& program, const std::wstring& arguments,
                const std::wstring& folder);
-    // The exit code, or nothing when the process still runs after `timeoutMs`.
+    // The exit code, or nothing while it still runs after `timeoutMs`.
     std::optional<DWORD> WaitForExit(DWORD timeoutMs);
     DWORD Id() const { return id_; }
 
@@ -93,12 +87,12 @@ class TestProcess {
     DWORD id_ = 0;
 };
 
-// The processor time so far of a process's threads, in milliseconds. Wine answers
-// GetProcessTimes for another process with the caller's own times, but reads each thread's
-// time from the system.
+// The processor time so far of a process's threads, in ms. Wine answers GetProcessTimes for
+// another process with the caller's own times, but reads each thread's from the system.
 double ProcessorMs(DWORD processId);
+// Expects a process left alone for five seconds to use under 1 % of one core; prints `what`.
+void ExpectIdle(DWORD processId, const char* what);
 
-// The message box a process shows, as the user reads it.
 struct MessageBoxSeen {
     HWND window = nullptr;
     std::wstring caption;
@@ -107,8 +101,7 @@ struct MessageBoxSeen {
 };
 std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs = kWindowWaitMs);
 // A visible message box of any process with this caption.
-std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption,
-                                                      DWORD timeoutMs = kWindowWaitMs);
+std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption);
 // Presses one of the box's buttons (IDOK, IDCANCEL, ...) and waits for the box to go.
 bool PressButton(const MessageBoxSeen& box, int buttonId);
 // Expects a message box of the process with this caption, text and buttons, and answers it.
@@ -118,19 +111,13 @@ void AnswerMessageBox(DWORD processId, const std::wstring& caption, const std::w
 // Visible top-level windows of a process with the given class (null: any class).
 std::vector<HWND> TopLevelWindows(DWORD processId, const wchar_t* className = nullptr);
 HWND WaitForWindow(DWORD processId, const wchar_t* className, DWORD timeoutMs = kWindowWaitMs);
-// Waits for a window of this class in any process (a program the launcher started) and closes
-// it; false when none came or it stayed.
+// Waits for a window of this class in any process and closes it; whether it came and went.
 bool CloseWindowOf(const wchar_t* className);
 
-// The sample disc as the build assembles it, copied for one test into a folder of its own
-// (its name has a space), so that a test may change it without touching the build.
+// The built sample disc, copied for one test into a folder of its own whose name has a space.
 class SampleDisc {
   public:
     SampleDisc();
-    // Removes the copy; programs started from it get a few seconds to close first.
-    ~SampleDisc();
-    SampleDisc(const SampleDisc&) = delete;
-    SampleDisc& operator=(const SampleDisc&) = delete;
 
     // With a trailing backslash.
     const std::wstring& Root() const { return root_; }
@@ -139,52 +126,54 @@ class SampleDisc {
 
     // Rewrites ORVAK.INI for another edition of the disc.
     void SetEdition(int sku) const;
-    // Takes a file, or a folder with everything in it, off the disc.
+    // Takes a file or folder off the disc, for good or until it is put back.
     void Remove(const std::wstring& relativePath) const;
-    // Takes a file away for a while, and puts it back.
     void MoveAside(const std::wstring& relativePath) const;
     void PutBack(const std::wstring& relativePath) const;
 
   private:
+    TempFolder folder_;  // removed with the copy when the test ends
     std::wstring root_;
 };
 
-// The companion programs' log for one test (set in this process's environment, so every
-// program started from here inherits it), removed when the test ends. Each line is split at its
-// tabs: program, arguments, folder.
+// A folder the installer makes: Program Files\Orvak, or the named one ("The Vemo") in it.
+std::wstring InstalledFolder(const std::wstring& name);
+
+// The companion programs' log for one test, named in this process's environment so that every
+// program started from here inherits it. A line is its tab-separated fields: program,
+// arguments, folder.
 using LogLine = std::vector<std::wstring>;
 class CompanionLog {
   public:
     CompanionLog();
     ~CompanionLog();
-    CompanionLog(const CompanionLog&) = delete;
-    CompanionLog& operator=(const CompanionLog&) = delete;
 
     std::vector<LogLine> Lines() const;
-    // Waits for the line after those already checked, and checks it. Folders compare as
-    // Windows compares them: in any case, with or without a final backslash.
+    // Waits for the line after those already checked and checks it; folders compare as
+    // Windows compares them (any case, with or without a final backslash).
     void ExpectNext(const std::wstring& program, const std::wstring& arguments,
                     const std::wstring& folder);
 
   private:
+    TempFolder folder_;
     std::wstring path_;
     std::size_t checked_ = 0;
 };
 
 // The launcher on its own copy of the sample disc (edition 1), with the product's and the
-// locale's keys gone before and after. Whatever the launcher, the programs it started or the
-// disc's installer left is closed or taken away when the test ends.
+// locale's keys gone before and after; whatever it, its started programs or the installer
+// left is closed or taken away when the test ends.
 class LauncherTest : public testing::Test {
   protected:
     void SetUp() override;
     void TearDown() override;
 
     // Starts the launcher (in `folder`, the disc's root when empty) and waits until its window
-    // is painted with the mouse at rest on it; false after a failure otherwise.
+    // is painted with the mouse at rest on it.
     bool Start(const std::wstring& arguments, const std::wstring& folder = L"");
     // Puts the mouse where it lights nothing; the window as it then settles.
     Screenshot Rest() const;
-    // Clicks the visible button carrying `id` with the real mouse, in its middle.
+    // Clicks the middle of the visible button `id` with the real mouse.
     bool Press(int id) const;
     // Opens the fold-out panel of `opener` unless `id` already shows, then presses `id`.
     bool PressInPanel(int opener, int id) const;
@@ -202,5 +191,28 @@ class LauncherTest : public testing::Test {
   private:
     bool gameInstalled_ = false;
 };
+
+// What the shell opens web addresses, help pages and videos with, for one test: the classes
+// keys it reads are set aside (so nothing is associated, not even Wine's own browser) and put
+// back as they were when it ends.
+class ShellAssociations {
+  public:
+    ShellAssociations();
+    ~ShellAssociations();
+    ShellAssociations(const ShellAssociations&) = delete;
+    ShellAssociations& operator=(const ShellAssociations&) = delete;
+
+    // http and https addresses open with `program`, given the address.
+    void OpenWebAddressesWith(const std::wstring& program) const;
+    // Files ending in `extension` (".htm", ".mpg") open with `program`, given the file.
+    void OpenFilesWith(const wchar_t* extension, const std::wstring& program) const;
+    // Everything above opens with the test viewer.
+    void OpenEverythingWithViewer() const;
+    void ForgetWebAddresses() const;
+    void ForgetFiles(const wchar_t* extension) const;
+};
+
+// The logging viewer built beside the tests.
+std::wstring ViewerProgram();
 
 #endif

@@ -64,47 +64,16 @@ TEST(ProgramFile, RunsFromSwapOnRemovableAndNetworkMediaWithAValidChecksum) {
     }
 }
 
-// An activation context made from the program's manifest, as Windows (or Wine) understands
-// the manifest: a misspelt namespace or element would simply be ignored there.
-class Manifest {
-  public:
-    explicit Manifest(const std::wstring& program) {
-        ACTCTXW request{};
-        request.cbSize = sizeof(request);
-        request.dwFlags = ACTCTX_FLAG_RESOURCE_NAME_VALID;
-        request.lpSource = program.c_str();
-        request.lpResourceName = CREATEPROCESS_MANIFEST_RESOURCE_ID;
-        context_ = CreateActCtxW(&request);
+// The answer of QueryActCtxW about an activation context; `index` picks the assembly.
+std::vector<char> Query(HANDLE context, ULONG what, DWORD index = 0) {
+    std::vector<char> buffer(4096);
+    SIZE_T written = 0;
+    if (!QueryActCtxW(0, context, &index, what, buffer.data(), buffer.size(), &written)) {
+        written = 0;
     }
-    ~Manifest() {
-        if (Valid()) ReleaseActCtx(context_);
-    }
-    Manifest(const Manifest&) = delete;
-    Manifest& operator=(const Manifest&) = delete;
-
-    bool Valid() const { return context_ != INVALID_HANDLE_VALUE; }
-
-    std::wstring Setting(const wchar_t* nameSpace, const wchar_t* name) const {
-        wchar_t value[64] = {};
-        SIZE_T written = 0;
-        QueryActCtxSettingsW(0, context_, nameSpace, name, value, 64, &written);
-        return value;
-    }
-
-    // The answer of QueryActCtxW; `index` picks the assembly for per-assembly questions.
-    std::vector<char> Query(ULONG what, DWORD index = 0) const {
-        std::vector<char> buffer(4096);
-        SIZE_T written = 0;
-        if (!QueryActCtxW(0, context_, &index, what, buffer.data(), buffer.size(), &written)) {
-            written = 0;
-        }
-        buffer.resize(written);
-        return buffer;
-    }
-
-  private:
-    HANDLE context_ = INVALID_HANDLE_VALUE;
-};
+    buffer.resize(written);
+    return buffer;
+}
 
 // The operating systems that the compatibility section names. Windows 10 1903 added a 64-bit
 // MaxVersionTested to each element (and with it 8-byte alignment), which MinGW's header lacks;
@@ -125,28 +94,30 @@ std::vector<GUID> SupportedOs(const std::vector<char>& info) {
     return systems;
 }
 
+// Through an activation context, as Windows understands the manifest: a misspelt namespace or
+// element would simply be ignored there.
 TEST(ProgramFile, ManifestAsWindowsReadsIt) {
-    struct System {
-        const char* name;
-        GUID id;
-    };
-    const System systems[] = {
-        {"Vista", {0xe2011457, 0x1546, 0x43c5, {0xa5, 0xfe, 0x00, 0x8d, 0xee, 0xe3, 0xd3, 0xf0}}},
-        {"7", {0x35138b9a, 0x5d96, 0x4fbd, {0x8e, 0x2d, 0xa2, 0x44, 0x02, 0x25, 0xf9, 0x3a}}},
-        {"8", {0x4a2f28e3, 0x53b9, 0x4441, {0xba, 0x9c, 0xd6, 0x9d, 0x4a, 0x4a, 0x6e, 0x38}}},
-        {"8.1", {0x1f676c76, 0x80e1, 0x4239, {0x95, 0xbb, 0x83, 0xd0, 0xf6, 0xd0, 0xda, 0x78}}},
-        {"10 and 11",
-         {0x8e0f7a12, 0xbfb3, 0x4fe8, {0xb9, 0xa5, 0x48, 0xfd, 0x50, 0xa1, 0x5a, 0x9a}}},
+    const GUID systems[] = {
+        {0xe2011457, 0x1546, 0x43c5, {0xa5, 0xfe, 0x00, 0x8d, 0xee, 0xe3, 0xd3, 0xf0}},  // Vista
+        {0x35138b9a, 0x5d96, 0x4fbd, {0x8e, 0x2d, 0xa2, 0x44, 0x02, 0x25, 0xf9, 0x3a}},  // 7
+        {0x4a2f28e3, 0x53b9, 0x4441, {0xba, 0x9c, 0xd6, 0x9d, 0x4a, 0x4a, 0x6e, 0x38}},  // 8
+        {0x1f676c76, 0x80e1, 0x4239, {0x95, 0xbb, 0x83, 0xd0, 0xf6, 0xd0, 0xda, 0x78}},  // 8.1
+        {0x8e0f7a12, 0xbfb3, 0x4fe8, {0xb9, 0xa5, 0x48, 0xfd, 0x50, 0xa1, 0x5a, 0x9a}},  // 10, 11
     };
     for (const BuiltProgram& program : BuiltPrograms()) {
         SCOPED_TRACE(program.build);
-        Manifest manifest(program.path);
-        ASSERT_TRUE(manifest.Valid())
+        ACTCTXW request{};
+        request.cbSize = sizeof(request);
+        request.dwFlags = ACTCTX_FLAG_RESOURCE_NAME_VALID;
+        request.lpSource = program.path.c_str();
+        request.lpResourceName = CREATEPROCESS_MANIFEST_RESOURCE_ID;
+        const HANDLE context = CreateActCtxW(&request);
+        ASSERT_NE(context, INVALID_HANDLE_VALUE)
             << "no manifest, or one Windows cannot read: " << GetLastError();
 
         // Common controls 6, the first assembly after the program's own.
         std::vector<char> details =
-            manifest.Query(AssemblyDetailedInformationInActivationContext, 2);
+            Query(context, AssemblyDetailedInformationInActivationContext, 2);
         ACTIVATION_CONTEXT_ASSEMBLY_DETAILED_INFORMATION assembly{};
         ASSERT_GE(details.size(), sizeof(assembly));
         std::memcpy(&assembly, details.data(), sizeof(assembly));
@@ -154,26 +125,32 @@ TEST(ProgramFile, ManifestAsWindowsReadsIt) {
         EXPECT_EQ(identity.find(L"Microsoft.Windows.Common-Controls,"), 0u) << identity;
         EXPECT_NE(identity.find(L"version=\"6."), std::wstring::npos) << identity;
 
-        std::vector<char> runLevel = manifest.Query(RunlevelInformationInActivationContext);
-        ASSERT_GE(runLevel.size(), sizeof(ACTIVATION_CONTEXT_RUN_LEVEL_INFORMATION));
+        std::vector<char> runLevel = Query(context, RunlevelInformationInActivationContext);
         ACTIVATION_CONTEXT_RUN_LEVEL_INFORMATION level{};
+        ASSERT_GE(runLevel.size(), sizeof(level));
         std::memcpy(&level, runLevel.data(), sizeof(level));
         EXPECT_EQ(level.RunLevel, ACTCTX_RUN_LEVEL_AS_INVOKER);
         EXPECT_EQ(level.UiAccess, 0u);
 
         std::vector<GUID> supported =
-            SupportedOs(manifest.Query(CompatibilityInformationInActivationContext));
+            SupportedOs(Query(context, CompatibilityInformationInActivationContext));
         EXPECT_EQ(supported.size(), std::size(systems));
-        for (const System& system : systems) {
-            SCOPED_TRACE(system.name);
-            EXPECT_NE(std::find(supported.begin(), supported.end(), system.id), supported.end());
+        for (const GUID& system : systems) {
+            EXPECT_NE(std::find(supported.begin(), supported.end(), system), supported.end())
+                << "a system is missing: " << system.Data1;
         }
 
         // Not DPI aware, with GDI scaling: sized for the screen and drawn sharp (README).
-        EXPECT_EQ(manifest.Setting(nullptr, L"dpiAware"), L"false");
-        EXPECT_EQ(manifest.Setting(L"http://schemas.microsoft.com/SMI/2017/WindowsSettings",
-                                   L"gdiScaling"),
+        auto setting = [&](const wchar_t* nameSpace, const wchar_t* name) {
+            wchar_t value[64] = {};
+            SIZE_T written = 0;
+            QueryActCtxSettingsW(0, context, nameSpace, name, value, 64, &written);
+            return std::wstring(value);
+        };
+        EXPECT_EQ(setting(nullptr, L"dpiAware"), L"false");
+        EXPECT_EQ(setting(L"http://schemas.microsoft.com/SMI/2017/WindowsSettings", L"gdiScaling"),
                   L"true");
+        ReleaseActCtx(context);
     }
 }
 
@@ -201,21 +178,18 @@ TEST(ProgramFile, VersionNamesTheMakerTheProductAndTheProjectVersion) {
         EXPECT_EQ(fixed->dwProductVersionMS, fixed->dwFileVersionMS);
         EXPECT_EQ(fixed->dwProductVersionLS, fixed->dwFileVersionLS);
 
-        struct Text {
-            const wchar_t* name;
-            std::wstring value;
-        };
-        for (const Text& text :
-             {Text{L"CompanyName", L"Orvak"},
-              Text{L"ProductName", L"The Vemo Vodizuri Virezazida AutoPlay"},
-              Text{L"FileVersion", versionText}, Text{L"ProductVersion", versionText},
-              Text{L"OriginalFilename", L"AutoPlay.exe"}}) {
-            SCOPED_TRACE(text.name);
-            wchar_t* value = nullptr;
-            std::wstring path = std::wstring(L"\\StringFileInfo\\040904B0\\") + text.name;
-            ASSERT_TRUE(VerQueryValueW(block.data(), path.c_str(), reinterpret_cast<void**>(&value),
+        for (const auto& [name, value] :
+             {std::pair<const wchar_t*, std::wstring>{L"CompanyName", L"Orvak"},
+              {L"ProductName", L"The Vemo Vodizuri Virezazida AutoPlay"},
+              {L"FileVersion", versionText},
+              {L"ProductVersion", versionText},
+              {L"OriginalFilename", L"AutoPlay.exe"}}) {
+            SCOPED_TRACE(name);
+            wchar_t* text = nullptr;
+            const std::wstring path = std::wstring(L"\\StringFileInfo\\040904B0\\") + name;
+            ASSERT_TRUE(VerQueryValueW(block.data(), path.c_str(), reinterpret_cast<void**>(&text),
                                        &length));
-            EXPECT_EQ(std::wstring(value), text.value);
+            EXPECT_EQ(std::wstring(text), value);
         }
     }
 }
