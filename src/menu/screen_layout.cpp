@@ -26,13 +26,13 @@ constexpr CommandLanguage kCommandLanguages[] = {
     {518, kKorean},     {519, kUkEnglish},
 };
 
-LanguageButtonSpec ListButton(std::uint32_t id, std::int32_t x, std::int32_t y) {
+LanguageButtonLayout ListButton(std::uint32_t id, std::int32_t x, std::int32_t y) {
     return {id, *LanguageOfCommand(id), x, y};
 }
 
 }  // namespace
 
-const CircleButtonSpec kListAboutButton{kListAboutIconKey, kCmdAbout, kStrCreator,
+const CircleButtonLayout kListAboutButton{kListAboutIconKey, kCmdAbout, kStrCreator,
                                         kAboutPlace, kAboutCircle};
 
 std::uint32_t OpenPanelValueFor(std::int32_t page) {
@@ -55,8 +55,8 @@ std::optional<LanguageBase> LanguageOfCommand(std::uint32_t id) {
     return std::nullopt;
 }
 
-LanguageListSpec LanguageListFor(std::uint32_t discSku) {
-    LanguageListSpec list;
+LanguageListLayout LanguageListFor(std::uint32_t discSku) {
+    LanguageListLayout list;
     switch (discSku) {
         case 1:
             list.productSku = 1;
@@ -111,9 +111,9 @@ std::int32_t PlayImageIndexFor(LanguageBase base) {
     }
 }
 
-std::vector<MainButtonSpec> MainPageButtons(std::uint32_t discSku, std::uint32_t productSku,
+std::vector<MainButtonLayout> MainPageButtons(std::uint32_t discSku, std::uint32_t productSku,
                                             LanguageBase base) {
-    std::vector<MainButtonSpec> buttons;
+    std::vector<MainButtonLayout> buttons;
     // The About button carries the Install label.
     buttons.push_back({MainButtonRole::About, {11, kCmdAbout, kStrInstall, kAboutPlace, kAboutCircle}});
     buttons.push_back(
@@ -137,11 +137,11 @@ std::vector<MainButtonSpec> MainPageButtons(std::uint32_t discSku, std::uint32_t
     return buttons;
 }
 
-std::optional<PanelSlotSpec> PanelSlotFor(std::int32_t page, std::int32_t slot) {
+std::optional<PanelSlotLayout> PanelSlotFor(std::int32_t page, std::int32_t slot) {
     // Slot 3 of the information and games panels has a picture but no button.
-    static constexpr PanelSlotSpec kInfo[] = {{4, 416, 28}, {5, 416, 81}, {6, 416, 133}, {7, 416, 185}};
-    static constexpr PanelSlotSpec kGames[] = {{0, 416, 29}, {1, 416, 81}, {2, 416, 133}, {3, 416, 185}};
-    static constexpr PanelSlotSpec kPlay[] = {{9, 295, 19}, {8, 295, 71}, {10, 295, 123}};
+    static constexpr PanelSlotLayout kInfo[] = {{4, 416, 28}, {5, 416, 81}, {6, 416, 133}, {7, 416, 185}};
+    static constexpr PanelSlotLayout kGames[] = {{0, 416, 29}, {1, 416, 81}, {2, 416, 133}, {3, 416, 185}};
+    static constexpr PanelSlotLayout kPlay[] = {{9, 295, 19}, {8, 295, 71}, {10, 295, 123}};
     if (slot < 0) return std::nullopt;
     switch (page) {
         case InfoPanel:
@@ -159,20 +159,20 @@ std::optional<PanelSlotSpec> PanelSlotFor(std::int32_t page, std::int32_t slot) 
     return std::nullopt;
 }
 
-std::vector<PanelButtonSpec> InfoPanelButtons() {
+std::vector<PanelButtonLayout> InfoPanelButtons() {
     return {{InfoPanel, 0, kCmdRegistration, kStrRegistration},
             {InfoPanel, 1, kCmdSupport, kStrSupportTool},
             {InfoPanel, 2, kCmdReadme, kStrReadme}};
 }
 
-std::vector<PanelButtonSpec> GamesPanelButtons() {
+std::vector<PanelButtonLayout> GamesPanelButtons() {
     return {{GamesPanel, 0, kCmdDemoPc, kStrDemoPc},
             {GamesPanel, 1, kCmdDemoDuskaro, kStrDemoDuskaro},
             {GamesPanel, 2, kCmdDemoLorrel, kStrDemoLorrel}};
 }
 
-std::vector<PanelButtonSpec> PlayPanelButtons() {
-    std::vector<PanelButtonSpec> buttons;
+std::vector<PanelButtonLayout> PlayPanelButtons() {
+    std::vector<PanelButtonLayout> buttons;
     for (std::int32_t slot = 0; slot < 3; ++slot) {
         buttons.push_back({PlayPanel, slot, kCmdPlay + static_cast<std::uint32_t>(slot),
                            kStrPlay800 + static_cast<std::uint32_t>(slot)});

@@ -40,7 +40,7 @@ struct HitCircle {
     std::int32_t radius;
 };
 
-struct CircleButtonSpec {
+struct CircleButtonLayout {
     std::int32_t imageIndex;
     std::uint32_t id;
     std::uint32_t labelOffset;
@@ -51,7 +51,7 @@ struct CircleButtonSpec {
 // The language list. Each language button is a plate labelled with its language's own name
 // (offset 73 of that language's strings) in that language's font; its plate picture is
 // 11 + its position in the list, because each plate carries the background of its place.
-struct LanguageButtonSpec {
+struct LanguageButtonLayout {
     std::uint32_t id;
     LanguageBase base;
     std::int32_t x;
@@ -62,48 +62,48 @@ constexpr std::int32_t kListPlateWidth = 212;
 constexpr std::int32_t kListPlateHeight = 50;
 constexpr std::uint32_t kLanguageNameOffset = 73;
 
-struct LanguageListSpec {
-    std::vector<LanguageButtonSpec> buttons;     // in creation order
+struct LanguageListLayout {
+    std::vector<LanguageButtonLayout> buttons;   // in creation order
     std::optional<std::uint32_t> productSku;     // the product edition the list stands for
     LanguageBase settledLanguage = kNoLanguage;  // editions without a list settle it at once
 };
-LanguageListSpec LanguageListFor(std::uint32_t discSku);
+LanguageListLayout LanguageListFor(std::uint32_t discSku);
 
 // The language a language command settles; none for the ids that name no language.
 std::optional<LanguageBase> LanguageOfCommand(std::uint32_t id);
 
 // The list's own About button: never shown, there only to share the About id.
-extern const CircleButtonSpec kListAboutButton;
+extern const CircleButtonLayout kListAboutButton;
 
 // The main page, in creation order.
 enum class MainButtonRole { About, Install, Play, MoreGames, WebSite, InfoPlace, Exit };
-struct MainButtonSpec {
+struct MainButtonLayout {
     MainButtonRole role;
-    CircleButtonSpec button;
+    CircleButtonLayout button;
 };
-std::vector<MainButtonSpec> MainPageButtons(std::uint32_t discSku, std::uint32_t productSku,
-                                            LanguageBase base);
+std::vector<MainButtonLayout> MainPageButtons(std::uint32_t discSku, std::uint32_t productSku,
+                                              LanguageBase base);
 // The Play button's picture: a few languages have a picture of their own.
 std::int32_t PlayImageIndexFor(LanguageBase base);
 
 // Panel plates: each (page, slot) has its picture and place; all are 209 × 49.
 constexpr std::int32_t kPanelPlateWidth = 209;
 constexpr std::int32_t kPanelPlateHeight = 49;
-struct PanelSlotSpec {
+struct PanelSlotLayout {
     std::int32_t imageIndex;
     std::int32_t x;
     std::int32_t y;
 };
-std::optional<PanelSlotSpec> PanelSlotFor(std::int32_t page, std::int32_t slot);
+std::optional<PanelSlotLayout> PanelSlotFor(std::int32_t page, std::int32_t slot);
 
-struct PanelButtonSpec {
+struct PanelButtonLayout {
     std::int32_t page;
     std::int32_t slot;
     std::uint32_t id;
     std::uint32_t labelOffset;
 };
-std::vector<PanelButtonSpec> InfoPanelButtons();
-std::vector<PanelButtonSpec> GamesPanelButtons();
-std::vector<PanelButtonSpec> PlayPanelButtons();
+std::vector<PanelButtonLayout> InfoPanelButtons();
+std::vector<PanelButtonLayout> GamesPanelButtons();
+std::vector<PanelButtonLayout> PlayPanelButtons();
 
 #endif

@@ -8,14 +8,14 @@
 void MenuController::BuildLanguageList(HWND parent) {
     if (launcher.languageKnown) return;
     launcher.languageBase = kNoLanguage;
-    const LanguageListSpec list = LanguageListFor(launcher.discSku);
+    const LanguageListLayout list = LanguageListFor(launcher.discSku);
     if (list.productSku) launcher.productSku = *list.productSku;
     std::int32_t position = 0;
-    for (const LanguageButtonSpec& spec : list.buttons) {
+    for (const LanguageButtonLayout& item : list.buttons) {
         // Each language's name, in its own script and font.
         auto button = std::make_unique<LauncherButton>(
-            parent, kFirstListPlate + position, spec.id, kLanguageNameOffset, spec.x, spec.y,
-            kListPlateWidth, kListPlateHeight, false, spec.base);
+            parent, kFirstListPlate + position, item.id, kLanguageNameOffset, item.x, item.y,
+            kListPlateWidth, kListPlateHeight, false, item.base);
         button->SetWanted(true);
         Register(LanguagePage, std::move(button));
         ++position;
@@ -25,7 +25,7 @@ void MenuController::BuildLanguageList(HWND parent) {
         launcher.languageKnown = true;
     }
     // The list's own About button is never shown; it shares the About id with the main menu's.
-    const CircleButtonSpec& about = kListAboutButton;
+    const CircleButtonLayout& about = kListAboutButton;
     auto button = std::make_unique<VemoLauncherButton>(
         parent, about.imageIndex, about.id, about.labelOffset, about.place.x, about.place.y,
         about.place.width, about.place.height, false, kActiveLanguage);
@@ -35,18 +35,18 @@ void MenuController::BuildLanguageList(HWND parent) {
 }
 
 void MenuController::BuildMainMenu(HWND parent) {
-    for (const MainButtonSpec& spec :
+    for (const MainButtonLayout& item :
          MainPageButtons(launcher.discSku, launcher.productSku, launcher.languageBase)) {
-        const CircleButtonSpec& b = spec.button;
+        const CircleButtonLayout& b = item.button;
         auto button = std::make_unique<VemoLauncherButton>(
             parent, b.imageIndex, b.id, b.labelOffset, b.place.x, b.place.y, b.place.width,
             b.place.height, false, kActiveLanguage);
         button->SetCircle(b.circle.centerX, b.circle.centerY, b.circle.radius);
         // Install and Play share one place: only one of them is ever wanted.
-        if (spec.role == MainButtonRole::Install && installed) button->SetWanted(false);
-        if (spec.role == MainButtonRole::Play && !installed) button->SetWanted(false);
+        if (item.role == MainButtonRole::Install && installed) button->SetWanted(false);
+        if (item.role == MainButtonRole::Play && !installed) button->SetWanted(false);
         const std::int32_t position = Register(MainPage, std::move(button));
-        switch (spec.role) {
+        switch (item.role) {
             case MainButtonRole::Install:
                 installIndex = position;
                 break;
@@ -64,8 +64,8 @@ void MenuController::BuildMainMenu(HWND parent) {
         }
     }
     // Built in every case, also when the Readme button took the More Information place.
-    for (const PanelButtonSpec& spec : InfoPanelButtons()) {
-        AddPanelButton(parent, spec.page, spec.slot, spec.id, spec.labelOffset);
+    for (const PanelButtonLayout& item : InfoPanelButtons()) {
+        AddPanelButton(parent, item.page, item.slot, item.id, item.labelOffset);
     }
     WriteLocale();
     if (launcher.discSku != 2) BuildGamesPanel(parent);
@@ -74,7 +74,7 @@ void MenuController::BuildMainMenu(HWND parent) {
 
 void MenuController::AddPanelButton(HWND parent, std::int32_t page, std::int32_t slot,
                                     std::uint32_t id, std::uint32_t labelOffset) {
-    const std::optional<PanelSlotSpec> place = PanelSlotFor(page, slot);
+    const std::optional<PanelSlotLayout> place = PanelSlotFor(page, slot);
     if (!place) return;
     Register(page, std::make_unique<LauncherButton>(parent, place->imageIndex, id, labelOffset,
                                                     place->x, place->y, kPanelPlateWidth,
@@ -82,13 +82,13 @@ void MenuController::AddPanelButton(HWND parent, std::int32_t page, std::int32_t
 }
 
 void MenuController::BuildGamesPanel(HWND parent) {
-    for (const PanelButtonSpec& spec : GamesPanelButtons()) {
-        AddPanelButton(parent, spec.page, spec.slot, spec.id, spec.labelOffset);
+    for (const PanelButtonLayout& item : GamesPanelButtons()) {
+        AddPanelButton(parent, item.page, item.slot, item.id, item.labelOffset);
     }
 }
 
 void MenuController::BuildPlayPanel(HWND parent) {
-    for (const PanelButtonSpec& spec : PlayPanelButtons()) {
-        AddPanelButton(parent, spec.page, spec.slot, spec.id, spec.labelOffset);
+    for (const PanelButtonLayout& item : PlayPanelButtons()) {
+        AddPanelButton(parent, item.page, item.slot, item.id, item.labelOffset);
     }
 }

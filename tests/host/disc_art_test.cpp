@@ -106,8 +106,8 @@ int CornerDifference(const Bitmap& picture, const Bitmap& ground, int x, int y) 
 // The generator keeps a copy of the layout; these rectangles come from the launcher's.
 std::vector<Rect> LayoutRects() {
     std::vector<Rect> rects;
-    for (const MainButtonSpec& spec : MainPageButtons(1, 1, kUsEnglish)) {
-        const ButtonPlace& p = spec.button.place;
+    for (const MainButtonLayout& item : MainPageButtons(1, 1, kUsEnglish)) {
+        const ButtonPlace& p = item.button.place;
         rects.push_back({p.x, p.y, p.width, p.height});
     }
     for (std::int32_t page : {InfoPanel, GamesPanel, PlayPanel}) {
@@ -150,8 +150,8 @@ class DiscArt : public ::testing::Test {
 TEST_F(DiscArt, MasksFitTheirHitCircleAndFadeBeforeTheEdgeAndTheOpaqueMaskIsNearlyOpaque) {
     std::map<int, HitCircle> circles;  // by picture; every language's Play picture
     for (const LanguageInfo& language : Languages()) {
-        for (const MainButtonSpec& spec : MainPageButtons(1, 1, language.base)) {
-            circles[spec.button.imageIndex] = spec.button.circle;
+        for (const MainButtonLayout& item : MainPageButtons(1, 1, language.base)) {
+            circles[item.button.imageIndex] = item.button.circle;
         }
     }
     ASSERT_EQ(circles.size(), 11u);
@@ -231,13 +231,13 @@ TEST_F(DiscArt, PlatesAndPanelsMatchWhatLiesUnderThemAndPlatesCarryTheirLabels) 
         MaskedBlend(picture.dib.get(), {0, 0}, ground.dib.get(), {place.x, place.y},
                     Picture(kOpaqueMaskId).dib.get(), {0, 0}, ground.dib.get(), {place.x, place.y},
                     {place.width, place.height});
-        for (std::int32_t slot = 0; auto spec = PanelSlotFor(page, slot); ++slot) {
-            plates.push_back({spec->imageIndex, spec->x, spec->y, &ground});
+        for (std::int32_t slot = 0; auto item = PanelSlotFor(page, slot); ++slot) {
+            plates.push_back({item->imageIndex, item->x, item->y, &ground});
         }
     }
     // The longest language list places every list plate.
     const Bitmap& list = Picture(kLanguageListBackgroundId);
-    const std::vector<LanguageButtonSpec> buttons = LanguageListFor(2).buttons;
+    const std::vector<LanguageButtonLayout> buttons = LanguageListFor(2).buttons;
     for (std::size_t i = 0; i < buttons.size(); ++i) {
         plates.push_back(
             {kFirstListPlate + static_cast<int>(i), buttons[i].x, buttons[i].y, &list});

@@ -220,7 +220,7 @@ TEST_F(MenuTest, ALatchedPlateShowsItsNormalFaceAndAButtonWithoutPicturesDrawsNo
 // Which buttons each screen shows, where and with which labels, is checked on the real
 // launcher; here that each button takes the picture and hit circle of its layout entry.
 TEST_F(MenuTest, EachButtonTakesThePictureAndHitCircleOfItsLayout) {
-    std::vector<PanelButtonSpec> plates = InfoPanelButtons();
+    std::vector<PanelButtonLayout> plates = InfoPanelButtons();
     for (const auto& more : {GamesPanelButtons(), PlayPanelButtons()}) {
         plates.insert(plates.end(), more.begin(), more.end());
     }
@@ -229,23 +229,23 @@ TEST_F(MenuTest, EachButtonTakesThePictureAndHitCircleOfItsLayout) {
         Fresh();
         launcher.languageBase = base;
         menu->BuildMainMenu(parent);
-        for (const MainButtonSpec& spec :
+        for (const MainButtonLayout& item :
              MainPageButtons(launcher.discSku, launcher.productSku, base)) {
-            SCOPED_TRACE(spec.button.id);
-            LauncherButton* button = Button(spec.button.id);
+            SCOPED_TRACE(item.button.id);
+            LauncherButton* button = Button(item.button.id);
             ASSERT_TRUE(button && button->IsShaped());
-            EXPECT_EQ(button->imageIndex, spec.button.imageIndex);
+            EXPECT_EQ(button->imageIndex, item.button.imageIndex);
             auto* circular = static_cast<VemoLauncherButton*>(button);
-            const HitCircle& circle = spec.button.circle;
+            const HitCircle& circle = item.button.circle;
             EXPECT_EQ(circular->centerX, circle.centerX);
             EXPECT_EQ(circular->centerY, circle.centerY);
             EXPECT_EQ(circular->radius, circle.radius);
         }
-        for (const PanelButtonSpec& spec : plates) {
-            SCOPED_TRACE(spec.id);
-            ASSERT_TRUE(Button(spec.id));
-            EXPECT_FALSE(Button(spec.id)->IsShaped());
-            EXPECT_EQ(Button(spec.id)->imageIndex, PanelSlotFor(spec.page, spec.slot)->imageIndex);
+        for (const PanelButtonLayout& item : plates) {
+            SCOPED_TRACE(item.id);
+            ASSERT_TRUE(Button(item.id));
+            EXPECT_FALSE(Button(item.id)->IsShaped());
+            EXPECT_EQ(Button(item.id)->imageIndex, PanelSlotFor(item.page, item.slot)->imageIndex);
         }
     }
     // The language list's plates in order, each name drawn in its own language's font, and the

@@ -330,10 +330,10 @@ void CheckLauncher(Checker& checker) {
 void CheckCommandFiles(Checker& checker, std::uint32_t edition,
                        const std::vector<ShownLanguage>& shown) {
     const bool supportTool = EditionHasSupportTool(edition);
-    const std::vector<MainButtonSpec> mainPage = MainPageButtons(edition, 0, shown.front().base);
+    const std::vector<MainButtonLayout> mainPage = MainPageButtons(edition, 0, shown.front().base);
     const bool gamesPanel = std::any_of(
         mainPage.begin(), mainPage.end(),
-        [](const MainButtonSpec& button) { return button.role == MainButtonRole::MoreGames; });
+        [](const MainButtonLayout& button) { return button.role == MainButtonRole::MoreGames; });
 
     checker.RequireFile(Joined(SetupFolder(L""), kInstallerProgram), "Install does nothing");
     std::vector<std::string> needDisc1 = {
@@ -366,7 +366,7 @@ void CheckCommandFiles(Checker& checker, std::uint32_t edition,
                                 ": Notepad opens and reports that the file cannot be found");
     }
     if (!gamesPanel) return;
-    for (const PanelButtonSpec& button : GamesPanelButtons()) {
+    for (const PanelButtonLayout& button : GamesPanelButtons()) {
         const ShellTarget demo = DemoTarget(L"", button.id);
         checker.RequireFile(Joined(demo.folder, demo.file), "its button says \"Sorry.  The demo " +
                                                                 Utf8(demo.file) +
@@ -410,9 +410,9 @@ std::vector<ShownLanguage> LanguagesShownBy(std::uint32_t edition) {
             shown.push_back({base, pickedAs});
         }
     };
-    const LanguageListSpec list = LanguageListFor(edition);
+    const LanguageListLayout list = LanguageListFor(edition);
     if (list.buttons.empty()) add(list.settledLanguage, kNoLanguage);
-    for (const LanguageButtonSpec& button : list.buttons) add(button.base, kNoLanguage);
+    for (const LanguageButtonLayout& button : list.buttons) add(button.base, kNoLanguage);
 
     // Once the product is installed the launcher opens in the language the installer
     // recorded, which the launcher's installer argument does not always name exactly.
