@@ -1,5 +1,6 @@
 #include "locale/catalogue_win.h"
 
+#include <atomic>
 #include <string>
 
 #include "graphics/picture_win.h"
@@ -105,17 +106,20 @@ DibBitmap* BackgroundFor(std::int32_t key) { return FindIn(catalogue.languageBac
 namespace {
 
 // The background files are most of what start-up reads, and reading them needs no GDI: a
-// thread of their own reads them while the display starts and the program's own pictures load.
+// thread of their own reads them while the program's own pictures load, and the main thread
+// takes its share of the files once it has nothing else to do.
 struct BackgroundReadAhead {
     std::wstring rootPath;
     HANDLE thread = nullptr;
     std::array<DibBitmap*, kLanguageCount> pictures{};
     std::array<bool, kLanguageCount> gdiNeeded{};
+    // The next file nobody has taken yet: each file is read by exactly one thread.
+    std::atomic<std::size_t> next{0};
 };
 BackgroundReadAhead readAhead;
 
 DWORD WINAPI ReadBackgroundFiles(void*) {
-    for (std::size_t i = 0; i < kLanguageCount; ++i) {
+    for (std::size_t i = readAhead.next++; i < kLanguageCount; i = readAhead.next++) {
         const std::wstring path = readAhead.rootPath + Languages()[i].backgroundFile;
         bool gdiNeeded = false;
         readAhead.pictures[i] = ReadStoredPictureFile(path.c_str(), gdiNeeded);
@@ -124,8 +128,12 @@ DWORD WINAPI ReadBackgroundFiles(void*) {
     return 0;
 }
 
+void FinishReadingBackgrounds();
+
 void StartReadingBackgrounds() {
+    FinishReadingBackgrounds();
     readAhead.rootPath = launcher.rootPath;
+    readAhead.next = 0;
     readAhead.thread = CreateThread(nullptr, 0, ReadBackgroundFiles, nullptr, 0, nullptr);
 }
 
@@ -138,6 +146,8 @@ DibPtr TakeReadAhead(std::size_t language, bool& ready, bool& gdiNeeded) {
 
 void FinishReadingBackgrounds() {
     if (!readAhead.thread) return;
+    // What is not read yet is not needed any more.
+    readAhead.next = kLanguageCount;
     WaitForSingleObject(readAhead.thread, INFINITE);
     CloseHandle(readAhead.thread);
     readAhead.thread = nullptr;
@@ -152,7 +162,10 @@ bool LoadBackgrounds() {
     // The pictures read ahead are the files' stored bytes, which are the pictures only where
     // GDI would hand those bytes back unchanged; anywhere else GDI reads the files again.
     const bool storedBytes = PicturesKeepTheirStoredBytes(kLoadFilePicture);
-    if (readAhead.thread) WaitForSingleObject(readAhead.thread, INFINITE);
+    if (readAhead.thread) {
+        ReadBackgroundFiles(nullptr);
+        WaitForSingleObject(readAhead.thread, INFINITE);
+    }
     for (std::size_t i = 0; i < kLanguageCount; ++i) {
         const LanguageInfo& language = Languages()[i];
         const std::wstring path = std::wstring(launcher.rootPath) + language.backgroundFile;
