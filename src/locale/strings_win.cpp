@@ -2,6 +2,7 @@
 
 #include <windows.h>
 
+#include "platform/system_style_win.h"
 #include "shell/launcher_state.h"
 
 int LoadLocalString(LanguageBase base, std::uint32_t offset, wchar_t* buffer,
@@ -24,5 +25,6 @@ int ShowLauncherMessage(std::uint32_t captionOffset, std::uint32_t textOffset, u
 }
 
 int ShowMessageBuffers(unsigned flags, HWND owner) {
+    SystemStyle style(launcher.instance);
     return MessageBoxW(owner, launcher.messageText, launcher.messageCaption, flags);
 }

@@ -1,5 +1,6 @@
 #include "shell/about_box_win.h"
 
+#include "platform/system_style_win.h"
 #include "shell/launcher_state.h"
 
 INT_PTR CALLBACK AboutProc(HWND dialog, UINT message, WPARAM wParam, LPARAM /*lParam*/) {
@@ -24,5 +25,6 @@ INT_PTR CALLBACK AboutProc(HWND dialog, UINT message, WPARAM wParam, LPARAM /*lP
 }
 
 void ShowAboutBox(HWND owner) {
+    SystemStyle style(launcher.instance);
     DialogBoxParamW(launcher.instance, kAboutDialog, owner, AboutProc, 0);
 }

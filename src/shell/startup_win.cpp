@@ -9,6 +9,7 @@
 #include "locale/config_win.h"
 #include "locale/strings_win.h"
 #include "platform/handles_win.h"
+#include "platform/system_style_win.h"
 #include "platform/text_win.h"
 #include "shell/launcher_state.h"
 #include "shell/mouse_hook_win.h"
@@ -68,7 +69,10 @@ void ReportNotOnDisc() {
     LanguageFromLangId(GetSystemDefaultLangID());
     wchar_t text[kMessageCapacity];
     LoadLocalString(launcher.languageBase, kStrNotOnDiscText, text, kMessageCapacity);
-    MessageBoxW(nullptr, text, launcher.emptyText, kNoticeFlags);
+    {
+        SystemStyle style(launcher.instance);
+        MessageBoxW(nullptr, text, launcher.emptyText, kNoticeFlags);
+    }
     if (!UninstallEntryExists()) launcher.menu.OnCommand(kInstallCommand);
 }
 

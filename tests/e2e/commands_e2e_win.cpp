@@ -1,7 +1,10 @@
 // Every command clicked on the real launcher: what it starts (from the companion log), whether
 // the launcher stays, and what the user is told when something is missing.
 #include <gtest/gtest.h>
+// clang-format off
 #include <windows.h>
+#include <psapi.h>  // after the types windows.h declares
+// clang-format on
 
 #include <cstring>
 #include <filesystem>
@@ -39,6 +42,30 @@ std::wstring EditText(HWND edit) {
                         SMTO_ABORTIFHUNG, 5000, &copied);
     text.resize(copied);
     return text;
+}
+
+// Whether a process has loaded common controls 6, which lives in the side-by-side store (the
+// system folder's library is version 5).
+bool HasCommonControls6(DWORD processId) {
+    UniqueHandle process(
+        OpenProcess(PROCESS_QUERY_INFORMATION | PROCESS_VM_READ, FALSE, processId));
+    HMODULE modules[1024];
+    DWORD bytes = 0;
+    if (!process || !EnumProcessModules(process.Get(), modules, sizeof(modules), &bytes)) {
+        ADD_FAILURE() << "the launcher's modules cannot be read";
+        return false;
+    }
+    for (DWORD i = 0; i < bytes / sizeof(HMODULE) && i < std::size(modules); ++i) {
+        wchar_t path[MAX_PATH] = {};
+        GetModuleFileNameExW(process.Get(), modules[i], path, MAX_PATH);
+        std::wstring name = path;
+        for (wchar_t& c : name) c = static_cast<wchar_t>(towlower(c));
+        if (name.find(L"common-controls") != std::wstring::npos &&
+            name.find(L"\\comctl32.dll") != std::wstring::npos) {
+            return true;
+        }
+    }
+    return false;
 }
 
 class Commands : public LauncherTest {
@@ -358,9 +385,12 @@ TEST_F(Commands, WithoutDiscOneCommandsAskUntilCancelledAndFailuresAreToldInTheM
 
 TEST_F(Commands, AboutBoxShowsItsPictureLeavesTheLauncherIdleAndClosesButNotWithEscape) {
     ASSERT_TRUE(Start(L"-l0409"));
+    // The system's style for the box, and not for the menu's own buttons at start-up.
+    EXPECT_FALSE(HasCommonControls6(launcher.Id()));
     ASSERT_TRUE(Press(1000));
     HWND box = WaitForWindow(launcher.Id(), L"#32770");
     ASSERT_TRUE(box) << "no About box";
+    EXPECT_TRUE(HasCommonControls6(launcher.Id()));
     EXPECT_FALSE(IsWindowEnabled(window)) << "the box is not modal";
     HWND picture = FindWindowExW(box, nullptr, L"Static", nullptr);
     ASSERT_TRUE(picture);

@@ -106,24 +106,35 @@ TEST(ProgramFile, ManifestAsWindowsReadsIt) {
     };
     for (const BuiltProgram& program : BuiltPrograms()) {
         SCOPED_TRACE(program.build);
-        ACTCTXW request{};
-        request.cbSize = sizeof(request);
-        request.dwFlags = ACTCTX_FLAG_RESOURCE_NAME_VALID;
-        request.lpSource = program.path.c_str();
-        request.lpResourceName = CREATEPROCESS_MANIFEST_RESOURCE_ID;
-        const HANDLE context = CreateActCtxW(&request);
-        ASSERT_NE(context, INVALID_HANDLE_VALUE)
-            << "no manifest, or one Windows cannot read: " << GetLastError();
-
-        // Common controls 6, the first assembly after the program's own.
-        std::vector<char> details =
-            Query(context, AssemblyDetailedInformationInActivationContext, 2);
-        ACTIVATION_CONTEXT_ASSEMBLY_DETAILED_INFORMATION assembly{};
-        ASSERT_GE(details.size(), sizeof(assembly));
-        std::memcpy(&assembly, details.data(), sizeof(assembly));
-        std::wstring identity = assembly.lpAssemblyEncodedAssemblyIdentity;
+        auto open = [&](const wchar_t* manifest) {
+            ACTCTXW request{};
+            request.cbSize = sizeof(request);
+            request.dwFlags = ACTCTX_FLAG_RESOURCE_NAME_VALID;
+            request.lpSource = program.path.c_str();
+            request.lpResourceName = manifest;
+            return CreateActCtxW(&request);
+        };
+        // The assembly after the program's own: common controls 6 for the boxes only, never
+        // for the whole process, whose first button would load the library at start-up.
+        auto firstDependency = [](HANDLE context) {
+            std::vector<char> details =
+                Query(context, AssemblyDetailedInformationInActivationContext, 2);
+            ACTIVATION_CONTEXT_ASSEMBLY_DETAILED_INFORMATION assembly{};
+            if (details.size() < sizeof(assembly)) return std::wstring();
+            std::memcpy(&assembly, details.data(), sizeof(assembly));
+            return std::wstring(assembly.lpAssemblyEncodedAssemblyIdentity);
+        };
+        const HANDLE boxes = open(MAKEINTRESOURCEW(2));
+        ASSERT_NE(boxes, INVALID_HANDLE_VALUE) << "no manifest for the boxes: " << GetLastError();
+        const std::wstring identity = firstDependency(boxes);
         EXPECT_EQ(identity.find(L"Microsoft.Windows.Common-Controls,"), 0u) << identity;
         EXPECT_NE(identity.find(L"version=\"6."), std::wstring::npos) << identity;
+        ReleaseActCtx(boxes);
+
+        const HANDLE context = open(CREATEPROCESS_MANIFEST_RESOURCE_ID);
+        ASSERT_NE(context, INVALID_HANDLE_VALUE)
+            << "no manifest, or one Windows cannot read: " << GetLastError();
+        EXPECT_EQ(firstDependency(context), L"");
 
         std::vector<char> runLevel = Query(context, RunlevelInformationInActivationContext);
         ACTIVATION_CONTEXT_RUN_LEVEL_INFORMATION level{};
