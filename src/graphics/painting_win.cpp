@@ -18,6 +18,19 @@ void PrepareTextDc(HDC dc, HFONT font) {
     if (font) SelectObject(dc, font);
 }
 
+// The background bitmap already holds the picture in the display's format: copying it out is
+// cheaper than converting the working copy again.
+bool CopyBackgroundBitmap(HDC dc) {
+    if (!launcher.backgroundBitmap) return false;
+    WindowDc screen(nullptr);
+    MemoryDc memory(CreateCompatibleDC(screen.Get()));
+    if (!memory) return false;
+    SelectionGuard bitmap(memory.Get(), launcher.backgroundBitmap.Get());
+    PaletteGuard palette(memory.Get(), launcher.palette.Get());
+    return BitBlt(dc, 0, 0, launcher.backgroundWidth, launcher.backgroundHeight, memory.Get(), 0, 0,
+                  SRCCOPY) != FALSE;
+}
+
 }  // namespace
 
 const DibBitmap* ShownBackground() {
@@ -42,8 +55,10 @@ void PaintLauncherWindow(HDC dc) {
         }
     }
     launcher.backgroundBitmap.Reset(BitmapFromDib(working, launcher.palette.Get()));
-    StretchDibBlt(dc, 0, 0, launcher.backgroundWidth, launcher.backgroundHeight, working, 0, 0,
-                  launcher.backgroundWidth, launcher.backgroundHeight, SRCCOPY);
+    if (!CopyBackgroundBitmap(dc)) {
+        StretchDibBlt(dc, 0, 0, launcher.backgroundWidth, launcher.backgroundHeight, working, 0, 0,
+                      launcher.backgroundWidth, launcher.backgroundHeight, SRCCOPY);
+    }
 
     if (launcher.languageKnown) {
         for (const CaptionPlacement& caption :
