@@ -19,9 +19,11 @@ void PrepareTextDc(HDC dc, HFONT font) {
 }
 
 // The background bitmap already holds the picture in the display's format: copying it out is
-// cheaper than converting the working copy again.
+// cheaper than converting the working copy again. On a palette display that format has lost
+// colours, which a DC of more colours (a printout, a window capture) would keep from the
+// working copy.
 bool CopyBackgroundBitmap(HDC dc) {
-    if (!launcher.backgroundBitmap) return false;
+    if (!launcher.backgroundBitmap || launcher.palette) return false;
     WindowDc screen(nullptr);
     MemoryDc memory(CreateCompatibleDC(screen.Get()));
     if (!memory) return false;
