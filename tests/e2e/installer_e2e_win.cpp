@@ -1,9 +1,10 @@
-// The launcher started off its disc and twice, and the disc's setup.exe as the launcher and a
-// user start it: what it installs and writes for the launcher, what it asks, and "-u".
+// The launcher off its disc and twice, and the disc's setup.exe: what it installs, asks and undoes.
 #include <gtest/gtest.h>
 
+#include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "launcher_driver_win.h"
 #include "locale/config_win.h"
@@ -16,9 +17,6 @@ namespace {
 constexpr DWORD kUserCancelled = 1602;  // ERROR_INSTALL_USEREXIT
 constexpr DWORD kInstallFailed = 1603;  // ERROR_INSTALL_FAILURE
 
-std::wstring MakerFolder() {
-    return InstalledFolder(L"");
-}
 std::wstring GameFolder() {
     return InstalledFolder(L"The Vemo");
 }
@@ -48,23 +46,12 @@ const wchar_t kSetupCaption[] = L"The Vemo Vodizuri Virezazida Setup";
 
 class Installer : public LauncherTest {
   protected:
-    void SetUp() override {
-        SetEnvironmentVariableW(L"VEMO_SETUP_SILENT", nullptr);
-        RemoveTree(MakerFolder());
-        LauncherTest::SetUp();
-    }
-    void TearDown() override {
-        LauncherTest::TearDown();
-        SetEnvironmentVariableW(L"VEMO_SETUP_SILENT", nullptr);
-        RemoveTree(MakerFolder());
-    }
-
     std::wstring SetupProgram() const { return disc.Path(L"Setup\\setup.exe"); }
 
     void ExpectNothingInstalled() {
         EXPECT_FALSE(KeyExists(kProductKeyPath));
         EXPECT_FALSE(KeyExists(kUninstallKeyPath));
-        EXPECT_EQ(GetFileAttributesW(MakerFolder().c_str()), INVALID_FILE_ATTRIBUTES)
+        EXPECT_EQ(GetFileAttributesW(InstalledFolder(L"").c_str()), INVALID_FILE_ATTRIBUTES)
             << "a folder was left in Program Files";
     }
 };
@@ -165,72 +152,60 @@ const wchar_t kNotOnDiscText[] =
 const wchar_t kInsertDiscText[] =
     L"To continue with this operation, please insert Disc 1 into the CD-ROM drive and click OK.";
 
-class LauncherStartup : public LauncherTest {
-  protected:
-    // Starts the launcher where none of its backgrounds are, which tells it that it is not on
-    // its disc, and answers the notice it shows.
-    void StartOffTheDiscAndAnswerTheNotice() {
-        disc.Remove(L"Launcher");
-        ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
-        AnswerMessageBox(launcher.Id(), L"", kNotOnDiscText, {IDOK}, IDOK);
-    }
-
-    // An installer the launcher started may log its start after the launcher has gone.
-    bool NothingStarted() const {
-        return !WaitUntil([&] { return !log.Lines().empty(); }, 3000);
-    }
-};
-
-TEST_F(LauncherStartup, OffTheDiscItSaysSoThenAsksForDiscOneUntilCancelled) {
-    disc.Remove(L"Setup\\data2.cab");
-    ASSERT_NO_FATAL_FAILURE(StartOffTheDiscAndAnswerTheNotice());
-    // OK with the disc still missing asks again; Cancel gives up and the launcher ends.
-    AnswerMessageBox(launcher.Id(), L"Insert Disc 1", kInsertDiscText, {IDOK, IDCANCEL}, IDOK);
-    AnswerMessageBox(launcher.Id(), L"Insert Disc 1", kInsertDiscText, {IDOK, IDCANCEL}, IDCANCEL);
-    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(NothingStarted()) << "nothing may be installed without the disc";
-}
-
-TEST_F(LauncherStartup, OffTheDiscWithTheSetupFilesItStartsTheInstallerInUsEnglish) {
-    ASSERT_NO_FATAL_FAILURE(StartOffTheDiscAndAnswerTheNotice());
-    log.ExpectNext(L"setup.exe", L"-l0009", disc.Path(L"Setup"));
-    // The installer asks before it installs; the user declines.
-    auto question = WaitForMessageBoxTitled(kSetupCaption);
-    ASSERT_TRUE(question) << "the installer did not ask";
-    EXPECT_NE(question->text.find(L"English"), std::wstring::npos);
-    ASSERT_TRUE(PressButton(*question, IDCANCEL));
-    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-}
-
-TEST_F(LauncherStartup, SecondLauncherEndsAtOnceWhileTheFirstSaysItIsOffTheDisc) {
+// Where none of its backgrounds are, the launcher knows it is not on its disc. The installer it
+// may start logs late, after the launcher has gone: rows that start nothing come first.
+TEST_F(Installer, OffTheDiscItSaysSoThenAsksForDiscOneOrInstallsUnlessInstalled) {
+    const struct {
+        const char* what;
+        const wchar_t* missing;  // moved off the disc for the row
+        bool productInstalled;
+    } rows[] = {
+        {"without data2.cab", L"Setup\\data2.cab", false},
+        {"with the product installed", nullptr, true},
+        {"with the setup files", nullptr, false},
+    };
     disc.Remove(L"Launcher");
-    ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
-    std::optional<MessageBoxSeen> notice = WaitForMessageBox(launcher.Id());
-    ASSERT_TRUE(notice);
-
-    TestProcess second;
-    ASSERT_TRUE(second.Start(disc.Launcher(), L"", disc.Root()));
-    EXPECT_EQ(second.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(TopLevelWindows(second.Id()).empty());
-    // The first one is still there, waiting for its user.
-    EXPECT_FALSE(launcher.WaitForExit(0).has_value());
-    EXPECT_TRUE(IsWindowVisible(notice->window));
-    // With the product installed, nothing more is asked or started after the notice.
-    ScopedMachineKey uninstall(kUninstallKeyPath);
-    ASSERT_TRUE(PressButton(*notice, IDOK));
-    EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(NothingStarted()) << "the installer was started";
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.what);
+        if (row.missing) disc.MoveAside(row.missing);
+        ASSERT_TRUE(launcher.Start(disc.Launcher(), L"", disc.Root()));
+        std::optional<MessageBoxSeen> notice = WaitForMessageBox(launcher.Id());
+        ASSERT_TRUE(notice);
+        EXPECT_EQ(notice->caption, L"");
+        EXPECT_EQ(notice->text, kNotOnDiscText);
+        EXPECT_EQ(notice->buttons, std::vector<int>{IDOK});
+        ExpectSecondLauncherEndsAtOnce();
+        EXPECT_TRUE(IsWindowVisible(notice->window)) << "the first launcher stopped waiting";
+        std::unique_ptr<ScopedMachineKey> uninstall;
+        if (row.productInstalled) uninstall = std::make_unique<ScopedMachineKey>(kUninstallKeyPath);
+        ASSERT_TRUE(PressButton(*notice, IDOK));
+        if (row.missing) {
+            // OK with the disc still missing asks again; Cancel gives up.
+            for (int answer : {IDOK, IDCANCEL}) {
+                AnswerMessageBox(launcher.Id(), L"Insert Disc 1", kInsertDiscText, {IDOK, IDCANCEL},
+                                 answer);
+            }
+            disc.PutBack(row.missing);
+        } else if (!row.productInstalled) {
+            // The installer asks before it installs; the user declines.
+            log.ExpectNext(L"setup.exe", L"-l0009", disc.Path(L"Setup"));
+            auto question = WaitForMessageBox(0, kSetupCaption);
+            ASSERT_TRUE(question) << "the installer did not ask";
+            EXPECT_NE(question->text.find(L"English"), std::wstring::npos);
+            ASSERT_TRUE(PressButton(*question, IDCANCEL));
+        }
+        EXPECT_EQ(launcher.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+        if (row.missing || row.productInstalled) {
+            EXPECT_FALSE(WaitUntil([&] { return !log.Lines().empty(); }, 3000)) << "started";
+        }
+    }
 }
 
-TEST_F(LauncherStartup, SecondLauncherBringsTheFirstBackRestoredAndInFront) {
+TEST_F(Installer, SecondLauncherBringsTheFirstBackRestoredAndInFront) {
     ASSERT_TRUE(Start(L"-l040c"));
     ShowWindow(window, SW_MINIMIZE);
     ASSERT_TRUE(WaitUntil([&] { return IsIconic(window) != FALSE; }, 5000));
-
-    TestProcess second;
-    ASSERT_TRUE(second.Start(disc.Launcher(), L"", disc.Root()));
-    EXPECT_EQ(second.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
-    EXPECT_TRUE(TopLevelWindows(second.Id()).empty());
+    ExpectSecondLauncherEndsAtOnce();
     EXPECT_TRUE(
         WaitUntil([&] { return !IsIconic(window) && GetForegroundWindow() == window; }, 5000))
         << "the first launcher stayed minimised or behind";

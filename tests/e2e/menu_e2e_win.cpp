@@ -1,6 +1,5 @@
-// What the user sees on the sample disc: each language's screen, each screen's buttons, the
-// language choice, Install turning into Play, the panels, the hover look, and what the launcher
-// holds and spends. With AUTOPLAY_SCREENSHOT_DIR set the screens are saved for the README.
+// What the user sees on the sample disc, and what the launcher holds and spends meanwhile.
+// With AUTOPLAY_SCREENSHOT_DIR set the screens are saved for the README.
 #include <gtest/gtest.h>
 
 #include <algorithm>
