@@ -1,5 +1,4 @@
-// The picture buttons and the menu controller in this process: pictures, hit circles, drawing,
-// the installation check against the real registry, and a screen built out of memory.
+// The picture buttons and the menu controller in this process, against the real registry.
 #include <gtest/gtest.h>
 
 #include <atomic>
@@ -292,19 +291,6 @@ TEST_F(MenuTest, OnTheListTheCheckChangesNoButtonALanguageIsChosenOnceAndItsAbou
     EXPECT_EQ(menu->pages[LanguagePage].back()->lastState, kNormal);
     EXPECT_EQ(menu->pages[MainPage][0]->lastState, kNotDrawn);
     menu->DrawButton(surface.Dc(), 4242, 0);  // no button: nothing happens
-}
-
-TEST_F(MenuTest, DestroyingAllButtonsTwiceLeavesNothing) {
-    menu->StartMainMenu(parent);
-    menu->installPath = L"C:\\Games";
-    ASSERT_GT(ChildWindows(), 0);
-    menu->DestroyAllButtons();
-    menu->DestroyAllButtons();
-    EXPECT_TRUE(menu->allButtons.empty());
-    EXPECT_TRUE(menu->buttonsByWindow.empty());
-    for (const auto& page : menu->pages) EXPECT_TRUE(page.empty());
-    EXPECT_TRUE(menu->installPath.empty());
-    EXPECT_EQ(ChildWindows(), 0);
 }
 
 TEST_F(MenuTest, AScreenBuiltWhileMemoryRunsOutKeepsWhatItBuiltAndLeaksNothing) {
