@@ -27,9 +27,11 @@ using Store = std::function<void(ScopedMachineKey&, const wchar_t* name)>;
 Store Text(std::wstring text) {
     return [text](ScopedMachineKey& key, const wchar_t* name) { key.SetText(name, text); };
 }
+// Wine quietly adds the terminator when the character after the data is NUL: here it is not.
 Store Unterminated(std::wstring text) {
-    return
-        [text](ScopedMachineKey& key, const wchar_t* name) { key.SetUnterminatedText(name, text); };
+    return [text](ScopedMachineKey& key, const wchar_t* name) {
+        key.Set(name, REG_SZ, (text + L"#").c_str(), static_cast<DWORD>(text.size() * 2));
+    };
 }
 Store Dword(DWORD value) {
     return [value](ScopedMachineKey& key, const wchar_t* name) { key.SetDword(name, value); };
@@ -137,7 +139,8 @@ TEST_F(Configuration, ProductEditionFromTheFirstByteOfVemoSku) {
         {"DWORD 0x105: its low byte", Dword(0x105), 5},
         {"a text holding the digit 3", Text(L"3"), 0},
         {"one binary byte",
-         [&](ScopedMachineKey& key, const wchar_t* name) { key.SetBinary(name, &seven, 1); }, 7},
+         [&](ScopedMachineKey& key, const wchar_t* name) { key.Set(name, REG_BINARY, &seven, 1); },
+         7},
         {"no value", Missing(), 0},
     };
     for (const Row& row : rows) {

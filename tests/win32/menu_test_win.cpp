@@ -4,6 +4,7 @@
 #include <atomic>
 #include <cstdlib>
 #include <new>
+#include <tuple>
 
 #include "graphics/masked_blend.h"
 #include "locale/catalogue_win.h"
@@ -151,15 +152,12 @@ TEST_F(MenuTest, ButtonsDrawTheirFaceCompositedOverTheBackgroundByThePlainRule) 
     for (const Case& c : cases) {
         SCOPED_TRACE(testing::Message() << "image " << c.image << " state " << c.state);
         Repaint();
-        std::unique_ptr<LauncherButton> button;
-        if (c.circular) {
-            button = std::make_unique<VemoLauncherButton>(parent, c.image, 1, 0, c.x, c.y, c.width,
-                                                          c.height, true, kActiveLanguage);
-        } else {
-            // No label, so that every pixel is the face's.
-            button = std::make_unique<LauncherButton>(parent, c.image, 1, 0, c.x, c.y, c.width,
-                                                      c.height, true, kActiveLanguage);
-        }
+        // No label, so that every pixel is the face's.
+        std::unique_ptr<LauncherButton> button(
+            c.circular ? new VemoLauncherButton(parent, c.image, 1, 0, c.x, c.y, c.width, c.height,
+                                                true, kActiveLanguage)
+                       : new LauncherButton(parent, c.image, 1, 0, c.x, c.y, c.width, c.height,
+                                            true, kActiveLanguage));
         Surface surface(c.width, c.height);
         button->DrawItem(surface.Dc(), c.itemState);
         EXPECT_EQ(button->lastState, c.state);
@@ -234,11 +232,10 @@ TEST_F(MenuTest, EachButtonTakesThePictureAndHitCircleOfItsLayout) {
             LauncherButton* button = Button(item.button.id);
             ASSERT_TRUE(button && button->IsShaped());
             EXPECT_EQ(button->imageIndex, item.button.imageIndex);
-            auto* circular = static_cast<VemoLauncherButton*>(button);
+            const auto* circular = static_cast<VemoLauncherButton*>(button);
             const HitCircle& circle = item.button.circle;
-            EXPECT_EQ(circular->centerX, circle.centerX);
-            EXPECT_EQ(circular->centerY, circle.centerY);
-            EXPECT_EQ(circular->radius, circle.radius);
+            EXPECT_EQ(std::make_tuple(circular->centerX, circular->centerY, circular->radius),
+                      std::make_tuple(circle.centerX, circle.centerY, circle.radius));
         }
         for (const PanelButtonLayout& item : plates) {
             SCOPED_TRACE(item.id);

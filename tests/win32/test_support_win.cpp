@@ -50,13 +50,6 @@ void ScopedMachineKey::Set(const wchar_t* name, DWORD type, const void* data, DW
               ERROR_SUCCESS);
 }
 
-void ScopedMachineKey::SetUnterminatedText(const wchar_t* name, const std::wstring& text) {
-    // Wine quietly adds the terminator when the character after the data is NUL, so the
-    // data is followed by something else here.
-    const std::wstring guarded = text + L"#";
-    Set(name, REG_SZ, guarded.data(), static_cast<DWORD>(text.size() * sizeof(wchar_t)));
-}
-
 TempFolder::TempFolder() {
     wchar_t base[MAX_PATH];
     GetTempPathW(MAX_PATH, base);
