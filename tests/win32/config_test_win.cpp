@@ -30,7 +30,8 @@ Store Text(std::wstring text) {
 // Wine quietly adds the terminator when the character after the data is NUL: here it is not.
 Store Unterminated(std::wstring text) {
     return [text](ScopedMachineKey& key, const wchar_t* name) {
-        key.Set(name, REG_SZ, (text + L"#").c_str(), static_cast<DWORD>(text.size() * 2));
+        key.Set(name, REG_SZ, (text + L"#").c_str(),
+                static_cast<DWORD>(text.size() * sizeof(wchar_t)));
     };
 }
 Store Dword(DWORD value) {
