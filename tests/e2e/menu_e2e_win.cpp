@@ -441,13 +441,12 @@ void ExpectCentredPopup(HWND window) {
     const int height = 480 + 2 * GetSystemMetrics(SM_CYDLGFRAME);
     const int left = (GetSystemMetrics(SM_CXFULLSCREEN) - width) >> 1;
     const int top = (GetSystemMetrics(SM_CYFULLSCREEN) - height) >> 1;
-    RECT frame{};
+    RECT frame{}, client{};
     GetWindowRect(window, &frame);
-    EXPECT_EQ(std::vector<LONG>({frame.left, frame.top, frame.right, frame.bottom}),
-              std::vector<LONG>({left, top, left + width, top + height}));
-    RECT client{};
     GetClientRect(window, &client);
-    EXPECT_EQ(std::vector<LONG>({client.right, client.bottom}), std::vector<LONG>({640, 480}));
+    EXPECT_EQ(std::vector<LONG>(
+                  {frame.left, frame.top, frame.right, frame.bottom, client.right, client.bottom}),
+              std::vector<LONG>({left, top, left + width, top + height, 640, 480}));
     const LONG style = GetWindowLongW(window, GWL_STYLE);
     EXPECT_TRUE(style & WS_POPUP);
     EXPECT_NE(style & WS_CAPTION, WS_CAPTION) << "the window must have no caption";
