@@ -57,14 +57,6 @@ BOOL CALLBACK CountWindow(HWND, LPARAM count) {
     return TRUE;
 }
 
-// A button window's procedure, counting the show messages it gets.
-int showMessages = 0;
-WNDPROC buttonProc = nullptr;
-LRESULT CALLBACK CountingButtonProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    if (message == WM_SHOWWINDOW) ++showMessages;
-    return CallWindowProcW(buttonProc, window, message, wParam, lParam);
-}
-
 class MenuTest : public DiscTest {
   protected:
     void SetUp() override {
@@ -118,22 +110,6 @@ class MenuTest : public DiscTest {
     HWND parent = nullptr;
     std::unique_ptr<MenuController> menu = std::make_unique<MenuController>();
 };
-
-TEST_F(MenuTest, ShowCallsShowWindowOnlyOnAChangeAndSetWantedSaysWhetherItChanged) {
-    LauncherButton button(parent, 0, 601, 0, 10, 10, 209, 49, false, kActiveLanguage);
-    buttonProc = reinterpret_cast<WNDPROC>(SetWindowLongPtrW(
-        button.window, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(CountingButtonProc)));
-    showMessages = 0;
-    button.Show(true);
-    button.Show(true);
-    EXPECT_EQ(showMessages, 1);
-    EXPECT_TRUE(GetWindowLongW(button.window, GWL_STYLE) & WS_VISIBLE);
-    button.Show(false);
-    EXPECT_EQ(showMessages, 2);
-    EXPECT_FALSE(button.SetWanted(true)) << "wanted from the start";
-    EXPECT_TRUE(button.SetWanted(false));
-    EXPECT_FALSE(button.SetWanted(false));
-}
 
 TEST_F(MenuTest, ButtonsDrawTheirFaceCompositedOverTheBackgroundByThePlainRule) {
     struct Case {
