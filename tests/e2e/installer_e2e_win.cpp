@@ -67,7 +67,7 @@ TEST_F(Installer, SilentInstallLeavesWhatTheLauncherReadsAndUninstallTakesItAway
     };
     for (const Row& row : rows) {
         SCOPED_TRACE(testing::Message() << "setup.exe " << row.arguments);
-        row.edition ? disc.SetEdition(static_cast<int>(row.edition)) : disc.Remove(L"ORVAK.INI");
+        row.edition ? disc.SetEdition(static_cast<int>(row.edition)) : disc.MoveAside(L"ORVAK.INI");
         SetEnvironmentVariableW(L"VEMO_SETUP_SILENT", row.silentByEnvironment ? L"1" : nullptr);
         ASSERT_EQ(RunSetup(row.arguments), std::optional<DWORD>(0));
 
@@ -120,7 +120,7 @@ TEST_F(Installer, AskingFirstNamesTheLanguageInstallsOnOkAndTellsWhereAndNothing
 TEST_F(Installer, ADiscWithoutTheCreatorToolOrAnUnreadableCommandLineInstallsNothing) {
     EXPECT_EQ(RunSetup(L"-s -l04g7"), std::optional<DWORD>(ERROR_INVALID_PARAMETER));
     ExpectNothingInstalled();
-    disc.Remove(L"Setup\\Program\\TheVemoCreator.exe");
+    disc.MoveAside(L"Setup\\Program\\TheVemoCreator.exe");
     EXPECT_EQ(RunSetup(L"-l0407 -s"), std::optional<DWORD>(kInstallFailed));
     ExpectNothingInstalled();
 }
@@ -142,7 +142,7 @@ TEST_F(Installer, OffTheDiscItSaysSoThenAsksForDiscOneOrInstallsUnlessInstalled)
         {"with the product installed", nullptr, true},
         {"with the setup files", nullptr, false},
     };
-    disc.Remove(L"Launcher");
+    disc.MoveAside(L"Launcher");
     for (const auto& row : rows) {
         SCOPED_TRACE(row.what);
         if (row.missing) disc.MoveAside(row.missing);

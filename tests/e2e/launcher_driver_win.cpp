@@ -362,11 +362,6 @@ void SampleDisc::SetEdition(int sku) const {
     EXPECT_TRUE(ini.flush()) << "ORVAK.INI could not be written";
 }
 
-void SampleDisc::Remove(const std::wstring& relativePath) const {
-    std::error_code error;
-    EXPECT_GT(std::filesystem::remove_all(Path(relativePath), error), 0u) << "nothing to remove";
-}
-
 void SampleDisc::MoveAside(const std::wstring& relativePath) const {
     ASSERT_TRUE(MoveFileW(Path(relativePath).c_str(), Path(relativePath + L".away").c_str()));
 }

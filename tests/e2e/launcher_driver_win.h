@@ -127,8 +127,7 @@ class SampleDisc {
 
     // Rewrites ORVAK.INI for another edition of the disc.
     void SetEdition(int sku) const;
-    // Takes a file or folder off the disc, for good or until it is put back.
-    void Remove(const std::wstring& relativePath) const;
+    // Takes a file or folder off the disc, for the test or until it is put back.
     void MoveAside(const std::wstring& relativePath) const;
     void PutBack(const std::wstring& relativePath) const;
 

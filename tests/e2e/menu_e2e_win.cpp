@@ -204,7 +204,7 @@ TEST_F(Menu, EachEditionOffersItsLanguagesOrSettlesOneAndTheChoiceWritesItsLocal
     for (const Row& row : rows) {
         SCOPED_TRACE(testing::Message() << "disc edition " << row.edition);
         DeleteMachineKey(kLocaleKeyPath);
-        row.edition ? disc.SetEdition(row.edition) : disc.Remove(L"ORVAK.INI");
+        row.edition ? disc.SetEdition(row.edition) : disc.MoveAside(L"ORVAK.INI");
         ASSERT_TRUE(Start(L""));
         const LanguageList list = row.list ? *row.list : LanguageList{};
         if (row.list) {
