@@ -298,45 +298,36 @@ MessageBoxSeen ReadMessageBox(HWND window) {
 
 }  // namespace
 
-std::vector<HWND> TopLevelWindows(DWORD processId, const wchar_t* className) {
+std::vector<HWND> TopLevelWindows(DWORD processId, const wchar_t* className,
+                                  const wchar_t* caption) {
     std::vector<HWND> found;
-    for (HWND window = nullptr; (window = FindWindowExW(nullptr, window, className, nullptr));) {
+    for (HWND window = nullptr; (window = FindWindowExW(nullptr, window, className, caption));) {
         DWORD owner = 0;
         GetWindowThreadProcessId(window, &owner);
-        if (owner == processId && IsWindowVisible(window)) found.push_back(window);
+        if ((!processId || owner == processId) && IsWindowVisible(window)) found.push_back(window);
     }
     return found;
 }
 
-HWND WaitForWindow(DWORD processId, const wchar_t* className, DWORD timeoutMs) {
+HWND WaitForWindow(DWORD processId, const wchar_t* className, const wchar_t* caption,
+                   DWORD timeoutMs) {
     std::vector<HWND> windows;
-    WaitUntil([&] { return !(windows = TopLevelWindows(processId, className)).empty(); },
+    WaitUntil([&] { return !(windows = TopLevelWindows(processId, className, caption)).empty(); },
               timeoutMs);
     return windows.empty() ? nullptr : windows.front();
 }
 
 bool CloseWindowOf(const wchar_t* className) {
-    HWND shown = nullptr;
-    if (!WaitUntil([&] { return (shown = FindWindowW(className, nullptr)) != nullptr; },
-                   kWindowWaitMs)) {
-        return false;
-    }
+    HWND shown = WaitForWindow(0, className);
+    if (!shown) return false;
     PostMessageW(shown, WM_CLOSE, 0, 0);
     return WaitUntil([&] { return !IsWindow(shown); }, kWindowWaitMs);
 }
 
-std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs) {
-    HWND window = WaitForWindow(processId, L"#32770", timeoutMs);
+std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, const wchar_t* caption,
+                                                DWORD timeoutMs) {
+    HWND window = WaitForWindow(processId, L"#32770", caption, timeoutMs);
     if (!window) return std::nullopt;
-    return ReadMessageBox(window);
-}
-
-std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption) {
-    HWND window = nullptr;
-    auto shown = [&] {
-        return (window = FindWindowW(L"#32770", caption.c_str())) && IsWindowVisible(window);
-    };
-    if (!WaitUntil(shown, kWindowWaitMs)) return std::nullopt;
     return ReadMessageBox(window);
 }
 
@@ -369,11 +360,6 @@ void SampleDisc::SetEdition(int sku) const {
     std::ofstream ini(std::filesystem::path(Path(L"ORVAK.INI")), std::ios::binary);
     ini << "[SKU]\r\nSKU=" << sku << "\r\n";
     EXPECT_TRUE(ini.flush()) << "ORVAK.INI could not be written";
-}
-
-void SampleDisc::Remove(const std::wstring& relativePath) const {
-    std::error_code error;
-    EXPECT_GT(std::filesystem::remove_all(Path(relativePath), error), 0u) << "nothing to remove";
 }
 
 void SampleDisc::MoveAside(const std::wstring& relativePath) const {
@@ -442,6 +428,8 @@ const wchar_t* const kStartedWindowClasses[] = {L"Brask", L"VemoCreatorWindow", 
 void ForgetTheProduct() {
     DeleteMachineKey(L"Software\\Orvak");
     DeleteMachineKey(kUninstallKeyPath);
+    SetEnvironmentVariableW(L"VEMO_SETUP_SILENT", nullptr);
+    RemoveTree(InstalledFolder(L""));
 }
 
 }  // namespace
@@ -526,6 +514,13 @@ std::optional<DWORD> LauncherTest::RunSetup(const std::wstring& arguments) {
     return setup.WaitForExit(3 * kWindowWaitMs);
 }
 
+void LauncherTest::ExpectSecondLauncherEndsAtOnce() const {
+    TestProcess second;
+    ASSERT_TRUE(second.Start(disc.Launcher(), L"", disc.Root()));
+    EXPECT_EQ(second.WaitForExit(kWindowWaitMs), std::optional<DWORD>(0));
+    EXPECT_TRUE(TopLevelWindows(second.Id()).empty()) << "the second launcher showed a window";
+}
+
 namespace {
 
 // HKEY_CLASSES_ROOT merges the machine's and the user's classes: both are set aside.
@@ -604,15 +599,8 @@ void ShellAssociations::OpenEverythingWithViewer() const {
     OpenFilesWith(L".mpg", ViewerProgram());
 }
 
-void ShellAssociations::ForgetWebAddresses() const {
-    for (const wchar_t* protocol : {L"http", L"https"}) {
-        DeleteKey(HKEY_LOCAL_MACHINE, kClasses + std::wstring(protocol));
-    }
-}
-
-void ShellAssociations::ForgetFiles(const wchar_t* extension) const {
-    DeleteKey(HKEY_LOCAL_MACHINE, kClasses + std::wstring(extension));
-    DeleteKey(HKEY_LOCAL_MACHINE, kClasses + (L"AutoPlayTests" + std::wstring(extension)));
+void ShellAssociations::Forget() const {
+    for (const wchar_t* name : kNames) DeleteKey(HKEY_LOCAL_MACHINE, kClasses + std::wstring(name));
 }
 
 std::wstring ViewerProgram() {

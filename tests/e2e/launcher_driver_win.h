@@ -1,6 +1,5 @@
-// Driving the real AutoPlay.exe as a user would, on a copy of the sample disc: its windows and
-// message boxes, the real mouse and keys, its client area read back as pixels, and the log the
-// started programs write. Every wait is bounded.
+// Driving the real AutoPlay.exe as a user would, on a copy of the sample disc: windows, the real
+// mouse and keys, pixels, and the log the started programs write. Every wait is bounded.
 #ifndef AUTOPLAY_TESTS_LAUNCHER_DRIVER_WIN_H
 #define AUTOPLAY_TESTS_LAUNCHER_DRIVER_WIN_H
 
@@ -99,18 +98,20 @@ struct MessageBoxSeen {
     std::wstring text;
     std::vector<int> buttons;  // control ids of its push buttons
 };
-std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, DWORD timeoutMs = kWindowWaitMs);
-// A visible message box of any process with this caption.
-std::optional<MessageBoxSeen> WaitForMessageBoxTitled(const std::wstring& caption);
+// A message box of the process (0: of any process) with this caption (null: any caption).
+std::optional<MessageBoxSeen> WaitForMessageBox(DWORD processId, const wchar_t* caption = nullptr,
+                                                DWORD timeoutMs = kWindowWaitMs);
 // Presses one of the box's buttons (IDOK, IDCANCEL, ...) and waits for the box to go.
 bool PressButton(const MessageBoxSeen& box, int buttonId);
 // Expects a message box of the process with this caption, text and buttons, and answers it.
 void AnswerMessageBox(DWORD processId, const std::wstring& caption, const std::wstring& text,
                       const std::vector<int>& buttons, int answer);
 
-// Visible top-level windows of a process with the given class (null: any class).
-std::vector<HWND> TopLevelWindows(DWORD processId, const wchar_t* className = nullptr);
-HWND WaitForWindow(DWORD processId, const wchar_t* className, DWORD timeoutMs = kWindowWaitMs);
+// Visible top-level windows of a process (0: any) with this class and caption (null: any).
+std::vector<HWND> TopLevelWindows(DWORD processId, const wchar_t* className = nullptr,
+                                  const wchar_t* caption = nullptr);
+HWND WaitForWindow(DWORD processId, const wchar_t* className, const wchar_t* caption = nullptr,
+                   DWORD timeoutMs = kWindowWaitMs);
 // Waits for a window of this class in any process and closes it; whether it came and went.
 bool CloseWindowOf(const wchar_t* className);
 
@@ -126,8 +127,7 @@ class SampleDisc {
 
     // Rewrites ORVAK.INI for another edition of the disc.
     void SetEdition(int sku) const;
-    // Takes a file or folder off the disc, for good or until it is put back.
-    void Remove(const std::wstring& relativePath) const;
+    // Takes a file or folder off the disc, for the test or until it is put back.
     void MoveAside(const std::wstring& relativePath) const;
     void PutBack(const std::wstring& relativePath) const;
 
@@ -139,10 +139,8 @@ class SampleDisc {
 // A folder the installer makes: Program Files\Orvak, or the named one ("The Vemo") in it.
 std::wstring InstalledFolder(const std::wstring& name);
 
-// The companion programs' log for one test, named in this process's environment so that every
-// program started from here inherits it. A line is its tab-separated fields: program,
-// arguments, folder.
-using LogLine = std::vector<std::wstring>;
+// The started programs' log, named in the environment every program started from here inherits.
+using LogLine = std::vector<std::wstring>;  // program, arguments, folder
 class CompanionLog {
   public:
     CompanionLog();
@@ -160,16 +158,14 @@ class CompanionLog {
     std::size_t checked_ = 0;
 };
 
-// The launcher on its own copy of the sample disc (edition 1), with the product's and the
-// locale's keys gone before and after; whatever it, its started programs or the installer
-// left is closed or taken away when the test ends.
+// The launcher on its own copy of the sample disc (edition 1), the product gone before and after;
+// whatever it, its started programs or the installer left is closed or taken away at the end.
 class LauncherTest : public testing::Test {
   protected:
     void SetUp() override;
     void TearDown() override;
 
-    // Starts the launcher (in `folder`, the disc's root when empty) and waits until its window
-    // is painted with the mouse at rest on it.
+    // Starts the launcher in `folder` (else the disc's root) and waits for its painted window.
     bool Start(const std::wstring& arguments, const std::wstring& folder = L"");
     // Puts the mouse where it lights nothing; the window as it then settles.
     Screenshot Rest() const;
@@ -182,6 +178,8 @@ class LauncherTest : public testing::Test {
     bool StillRunning();
     // Runs the disc's setup.exe from its Setup folder, as the launcher does; its exit code.
     std::optional<DWORD> RunSetup(const std::wstring& arguments);
+    // A second launcher started now ends at once without showing a window.
+    void ExpectSecondLauncherEndsAtOnce() const;
 
     SampleDisc disc;
     CompanionLog log;
@@ -192,9 +190,8 @@ class LauncherTest : public testing::Test {
     bool gameInstalled_ = false;
 };
 
-// What the shell opens web addresses, help pages and videos with, for one test: the classes
-// keys it reads are set aside (so nothing is associated, not even Wine's own browser) and put
-// back as they were when it ends.
+// What the shell opens addresses, help pages and videos with: the classes keys are set aside (so
+// nothing is associated, not even Wine's own browser) and put back when the test ends.
 class ShellAssociations {
   public:
     ShellAssociations();
@@ -208,8 +205,8 @@ class ShellAssociations {
     void OpenFilesWith(const wchar_t* extension, const std::wstring& program) const;
     // Everything above opens with the test viewer.
     void OpenEverythingWithViewer() const;
-    void ForgetWebAddresses() const;
-    void ForgetFiles(const wchar_t* extension) const;
+    // Nothing is associated again.
+    void Forget() const;
 };
 
 // The logging viewer built beside the tests.

@@ -1,6 +1,5 @@
-// What the user sees on the sample disc: each language's screen, each screen's buttons, the
-// language choice, Install turning into Play, the panels, the hover look, and what the launcher
-// holds and spends. With AUTOPLAY_SCREENSHOT_DIR set the screens are saved for the README.
+// What the user sees on the sample disc, and what the launcher holds and spends meanwhile.
+// With AUTOPLAY_SCREENSHOT_DIR set the screens are saved for the README.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -205,7 +204,7 @@ TEST_F(Menu, EachEditionOffersItsLanguagesOrSettlesOneAndTheChoiceWritesItsLocal
     for (const Row& row : rows) {
         SCOPED_TRACE(testing::Message() << "disc edition " << row.edition);
         DeleteMachineKey(kLocaleKeyPath);
-        row.edition ? disc.SetEdition(row.edition) : disc.Remove(L"ORVAK.INI");
+        row.edition ? disc.SetEdition(row.edition) : disc.MoveAside(L"ORVAK.INI");
         ASSERT_TRUE(Start(L""));
         const LanguageList list = row.list ? *row.list : LanguageList{};
         if (row.list) {
@@ -345,16 +344,17 @@ TEST_F(Menu, TheMouseLightsACircleInsideItAndAPlateAnywhereOnIt) {
     HWND install = VisibleButton(window, kInstall.id);
     ASSERT_TRUE(install);
     const Screenshot before = SettledShot(window);
+    // The mouse moved to `at`; the window once `lit` has the focus.
+    auto hover = [&](POINT at, HWND lit) {
+        MoveMouse(window, at);
+        EXPECT_TRUE(WaitUntil([&] { return FocusInThreadOf(window) == lit; }));
+        return SettledShot(window);
+    };
 
-    MoveMouse(window, kPlayCircle);  // the Install circle's centre
-    EXPECT_TRUE(WaitUntil([&] { return FocusInThreadOf(window) == install; }));
-    const Screenshot lit = SettledShot(window);
+    const Screenshot lit = hover(kPlayCircle, install);  // the Install circle's centre
     EXPECT_GT(lit.DifferingPixels(before, kInstall.place), 500) << "the hover face did not show";
     lit.SaveForReadme(L"menu-hover");
-
-    MoveMouse(window, {188, 164});  // inside the window, outside the circle
-    EXPECT_TRUE(WaitUntil([&] { return FocusInThreadOf(window) == window; }));
-    const Screenshot off = SettledShot(window);
+    const Screenshot off = hover({188, 164}, window);  // inside the window, outside the circle
     EXPECT_EQ(off.DifferingPixels(before, kInstall.place), 0) << "the hover face stayed";
 
     // A plate of an open panel takes the focus wherever the mouse is on it.
@@ -363,17 +363,11 @@ TEST_F(Menu, TheMouseLightsACircleInsideItAndAPlateAnywhereOnIt) {
     const Screenshot open = Rest();
     const Documented& registration = kInfoPanel[0];
     const Documented& support = kInfoPanel[1];
-    HWND registrationPlate = VisibleButton(window, registration.id);
-    HWND supportPlate = VisibleButton(window, support.id);
-    MoveMouse(window, {registration.place.left + 3, registration.place.top + 3});
-    EXPECT_TRUE(WaitUntil([&] { return FocusInThreadOf(window) == registrationPlate; }));
-    const Screenshot plateLit = SettledShot(window);
+    const Screenshot plateLit = hover({registration.place.left + 3, registration.place.top + 3},
+                                      VisibleButton(window, registration.id));
     EXPECT_GT(plateLit.DifferingPixels(open, registration.place, kPlateTrace), 100)
         << "the plate did not light";
-
-    MoveMouse(window, Centre(support.place));
-    EXPECT_TRUE(WaitUntil([&] { return FocusInThreadOf(window) == supportPlate; }));
-    const Screenshot moved = SettledShot(window);
+    const Screenshot moved = hover(Centre(support.place), VisibleButton(window, support.id));
     EXPECT_EQ(moved.DifferingPixels(open, registration.place, kPlateTrace), 0)
         << "the first plate stayed lit";
     EXPECT_GT(moved.DifferingPixels(open, support.place, kPlateTrace), 100)
@@ -447,13 +441,12 @@ void ExpectCentredPopup(HWND window) {
     const int height = 480 + 2 * GetSystemMetrics(SM_CYDLGFRAME);
     const int left = (GetSystemMetrics(SM_CXFULLSCREEN) - width) >> 1;
     const int top = (GetSystemMetrics(SM_CYFULLSCREEN) - height) >> 1;
-    RECT frame{};
+    RECT frame{}, client{};
     GetWindowRect(window, &frame);
-    EXPECT_EQ(std::vector<LONG>({frame.left, frame.top, frame.right, frame.bottom}),
-              std::vector<LONG>({left, top, left + width, top + height}));
-    RECT client{};
     GetClientRect(window, &client);
-    EXPECT_EQ(std::vector<LONG>({client.right, client.bottom}), std::vector<LONG>({640, 480}));
+    EXPECT_EQ(std::vector<LONG>(
+                  {frame.left, frame.top, frame.right, frame.bottom, client.right, client.bottom}),
+              std::vector<LONG>({left, top, left + width, top + height, 640, 480}));
     const LONG style = GetWindowLongW(window, GWL_STYLE);
     EXPECT_TRUE(style & WS_POPUP);
     EXPECT_NE(style & WS_CAPTION, WS_CAPTION) << "the window must have no caption";

@@ -1,6 +1,5 @@
-// AutoPlay.exe as it goes on the disc, read the way Windows reads it: its header, its manifest
-// through an activation context, and its version resource. The other build's program is read
-// too when it has been built (build/i686 beside build/x86_64).
+// AutoPlay.exe as it goes on the disc, read the way Windows reads it; the other build's too when
+// it has been built (build/i686 beside build/x86_64).
 #include <gtest/gtest.h>
 // imagehlp.h needs windows.h before it.
 // clang-format off

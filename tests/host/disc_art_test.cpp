@@ -1,7 +1,5 @@
-// Checks the generated pictures (in DISC_ART_DIR) against what the launcher relies on, read
-// from its own tables: masks that fit its hit circles, plates and panels cut from what lies
-// under them, backgrounds that differ only outside its layout, and colours its captions and
-// labels can be read on. Sizes, depths and the palette are the disc check's, on the built disc.
+// The generated pictures (in DISC_ART_DIR) against what the launcher's own tables rely on.
+// Sizes, depths and the palette are the disc check's, on the built disc.
 #include <gtest/gtest.h>
 
 #include <algorithm>

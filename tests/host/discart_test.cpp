@@ -1,5 +1,4 @@
-// The parts of the disc-art generator that its finished pictures cannot show are right: the
-// byte order of bitmap files, and lettering in every script of the greetings.
+// What the disc-art generator's finished pictures cannot show: byte order, and every script.
 #include <gtest/gtest.h>
 
 #include <string>

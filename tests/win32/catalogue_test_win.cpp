@@ -190,8 +190,7 @@ TEST_F(Catalogue, ReleaseLeavesNothingBehind) {
     EXPECT_EQ(FontFor(kUsEnglish), nullptr);  // the rest of the tables: the shutdown test's
 }
 
-// Every picture made straight from its resource's bytes (the launcher's way on displays of
-// more than 8 bits) is byte for byte what LoadImage and DibFromBitmap make of it.
+// The launcher's way on displays of more than 8 bits is byte for byte GDI's round trip.
 TEST_F(Catalogue, PicturesFromResourceBytesEqualTheGdiRoundTrip) {
     std::set<WORD> ids = {kLanguageListBackgroundId, kOpaqueMaskId};
     for (const auto& plates : kPlateResources) ids.insert(std::begin(plates), std::end(plates));

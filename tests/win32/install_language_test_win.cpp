@@ -1,5 +1,4 @@
-// setup.exe's side of the language hand-over: the "-l" identifier the launcher passes in,
-// the names written to the registry, and the launcher reading them back.
+// setup.exe's side of the language hand-over, and the launcher reading the names back.
 #include <gtest/gtest.h>
 
 #include <string>

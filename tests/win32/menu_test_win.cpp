@@ -1,10 +1,10 @@
-// The picture buttons and the menu controller in this process: pictures, hit circles, drawing,
-// the installation check against the real registry, and a screen built out of memory.
+// The picture buttons and the menu controller in this process, against the real registry.
 #include <gtest/gtest.h>
 
 #include <atomic>
 #include <cstdlib>
 #include <new>
+#include <tuple>
 
 #include "graphics/masked_blend.h"
 #include "locale/catalogue_win.h"
@@ -55,14 +55,6 @@ Rgb Composite(Rgb a, Rgb b, std::uint8_t m) {
 BOOL CALLBACK CountWindow(HWND, LPARAM count) {
     ++*reinterpret_cast<int*>(count);
     return TRUE;
-}
-
-// A button window's procedure, counting the show messages it gets.
-int showMessages = 0;
-WNDPROC buttonProc = nullptr;
-LRESULT CALLBACK CountingButtonProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    if (message == WM_SHOWWINDOW) ++showMessages;
-    return CallWindowProcW(buttonProc, window, message, wParam, lParam);
 }
 
 class MenuTest : public DiscTest {
@@ -119,22 +111,6 @@ class MenuTest : public DiscTest {
     std::unique_ptr<MenuController> menu = std::make_unique<MenuController>();
 };
 
-TEST_F(MenuTest, ShowCallsShowWindowOnlyOnAChangeAndSetWantedSaysWhetherItChanged) {
-    LauncherButton button(parent, 0, 601, 0, 10, 10, 209, 49, false, kActiveLanguage);
-    buttonProc = reinterpret_cast<WNDPROC>(SetWindowLongPtrW(
-        button.window, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(CountingButtonProc)));
-    showMessages = 0;
-    button.Show(true);
-    button.Show(true);
-    EXPECT_EQ(showMessages, 1);
-    EXPECT_TRUE(GetWindowLongW(button.window, GWL_STYLE) & WS_VISIBLE);
-    button.Show(false);
-    EXPECT_EQ(showMessages, 2);
-    EXPECT_FALSE(button.SetWanted(true)) << "wanted from the start";
-    EXPECT_TRUE(button.SetWanted(false));
-    EXPECT_FALSE(button.SetWanted(false));
-}
-
 TEST_F(MenuTest, ButtonsDrawTheirFaceCompositedOverTheBackgroundByThePlainRule) {
     struct Case {
         bool circular;
@@ -152,15 +128,12 @@ TEST_F(MenuTest, ButtonsDrawTheirFaceCompositedOverTheBackgroundByThePlainRule) 
     for (const Case& c : cases) {
         SCOPED_TRACE(testing::Message() << "image " << c.image << " state " << c.state);
         Repaint();
-        std::unique_ptr<LauncherButton> button;
-        if (c.circular) {
-            button = std::make_unique<VemoLauncherButton>(parent, c.image, 1, 0, c.x, c.y, c.width,
-                                                          c.height, true, kActiveLanguage);
-        } else {
-            // No label, so that every pixel is the face's.
-            button = std::make_unique<LauncherButton>(parent, c.image, 1, 0, c.x, c.y, c.width,
-                                                      c.height, true, kActiveLanguage);
-        }
+        // No label, so that every pixel is the face's.
+        std::unique_ptr<LauncherButton> button(
+            c.circular ? new VemoLauncherButton(parent, c.image, 1, 0, c.x, c.y, c.width, c.height,
+                                                true, kActiveLanguage)
+                       : new LauncherButton(parent, c.image, 1, 0, c.x, c.y, c.width, c.height,
+                                            true, kActiveLanguage));
         Surface surface(c.width, c.height);
         button->DrawItem(surface.Dc(), c.itemState);
         EXPECT_EQ(button->lastState, c.state);
@@ -235,11 +208,10 @@ TEST_F(MenuTest, EachButtonTakesThePictureAndHitCircleOfItsLayout) {
             LauncherButton* button = Button(item.button.id);
             ASSERT_TRUE(button && button->IsShaped());
             EXPECT_EQ(button->imageIndex, item.button.imageIndex);
-            auto* circular = static_cast<VemoLauncherButton*>(button);
+            const auto* circular = static_cast<VemoLauncherButton*>(button);
             const HitCircle& circle = item.button.circle;
-            EXPECT_EQ(circular->centerX, circle.centerX);
-            EXPECT_EQ(circular->centerY, circle.centerY);
-            EXPECT_EQ(circular->radius, circle.radius);
+            EXPECT_EQ(std::make_tuple(circular->centerX, circular->centerY, circular->radius),
+                      std::make_tuple(circle.centerX, circle.centerY, circle.radius));
         }
         for (const PanelButtonLayout& item : plates) {
             SCOPED_TRACE(item.id);
@@ -292,19 +264,6 @@ TEST_F(MenuTest, OnTheListTheCheckChangesNoButtonALanguageIsChosenOnceAndItsAbou
     EXPECT_EQ(menu->pages[LanguagePage].back()->lastState, kNormal);
     EXPECT_EQ(menu->pages[MainPage][0]->lastState, kNotDrawn);
     menu->DrawButton(surface.Dc(), 4242, 0);  // no button: nothing happens
-}
-
-TEST_F(MenuTest, DestroyingAllButtonsTwiceLeavesNothing) {
-    menu->StartMainMenu(parent);
-    menu->installPath = L"C:\\Games";
-    ASSERT_GT(ChildWindows(), 0);
-    menu->DestroyAllButtons();
-    menu->DestroyAllButtons();
-    EXPECT_TRUE(menu->allButtons.empty());
-    EXPECT_TRUE(menu->buttonsByWindow.empty());
-    for (const auto& page : menu->pages) EXPECT_TRUE(page.empty());
-    EXPECT_TRUE(menu->installPath.empty());
-    EXPECT_EQ(ChildWindows(), 0);
 }
 
 TEST_F(MenuTest, AScreenBuiltWhileMemoryRunsOutKeepsWhatItBuiltAndLeaksNothing) {

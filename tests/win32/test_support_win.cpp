@@ -3,6 +3,8 @@
 #include <gtest/gtest.h>
 
 #include <cstring>
+#include <filesystem>
+#include <fstream>
 
 #include "graphics/dib.h"
 #include "locale/catalogue_win.h"
@@ -50,13 +52,6 @@ void ScopedMachineKey::Set(const wchar_t* name, DWORD type, const void* data, DW
               ERROR_SUCCESS);
 }
 
-void ScopedMachineKey::SetUnterminatedText(const wchar_t* name, const std::wstring& text) {
-    // Wine quietly adds the terminator when the character after the data is NUL, so the
-    // data is followed by something else here.
-    const std::wstring guarded = text + L"#";
-    Set(name, REG_SZ, guarded.data(), static_cast<DWORD>(text.size() * sizeof(wchar_t)));
-}
-
 TempFolder::TempFolder() {
     wchar_t base[MAX_PATH];
     GetTempPathW(MAX_PATH, base);
@@ -92,14 +87,9 @@ std::wstring TempFolder::MakeFoldersFor(const std::wstring& relativePath) const 
 std::wstring TempFolder::WriteFile(const std::wstring& relativePath,
                                    const std::string& bytes) const {
     std::wstring path = MakeFoldersFor(relativePath);
-    HANDLE file = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS,
-                              FILE_ATTRIBUTE_NORMAL, nullptr);
-    EXPECT_NE(file, INVALID_HANDLE_VALUE);
-    if (file != INVALID_HANDLE_VALUE) {
-        DWORD written = 0;
-        ::WriteFile(file, bytes.data(), static_cast<DWORD>(bytes.size()), &written, nullptr);
-        CloseHandle(file);
-    }
+    std::ofstream file(std::filesystem::path(path), std::ios::binary);
+    EXPECT_TRUE(file.write(bytes.data(), static_cast<std::streamsize>(bytes.size())).flush().good())
+        << "cannot write a test file";
     return path;
 }
 

@@ -30,20 +30,14 @@ class ScopedMachineKey {
     ScopedMachineKey(const ScopedMachineKey&) = delete;
     ScopedMachineKey& operator=(const ScopedMachineKey&) = delete;
 
+    void Set(const wchar_t* name, DWORD type, const void* data, DWORD size);
     void SetText(const wchar_t* name, const std::wstring& text) {
         Set(name, REG_SZ, text.c_str(), static_cast<DWORD>((text.size() + 1) * sizeof(wchar_t)));
     }
-    // Stores the characters without a terminating NUL in the data.
-    void SetUnterminatedText(const wchar_t* name, const std::wstring& text);
     void SetDword(const wchar_t* name, DWORD value) { Set(name, REG_DWORD, &value, sizeof value); }
-    void SetBinary(const wchar_t* name, const void* data, DWORD size) {
-        Set(name, REG_BINARY, data, size);
-    }
     HKEY Get() const { return key_; }
 
   private:
-    void Set(const wchar_t* name, DWORD type, const void* data, DWORD size);
-
     std::wstring path_;
     REGSAM view_;
     HKEY key_ = nullptr;

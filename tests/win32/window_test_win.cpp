@@ -1,5 +1,4 @@
-// The launcher's window procedure in this process: activation, the installed game's caption,
-// palette messages, and a shutdown that leaves nothing behind.
+// The launcher's window procedure in this process, and a shutdown that leaves nothing behind.
 #include <gtest/gtest.h>
 
 #include <cstdlib>
