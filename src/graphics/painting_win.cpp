@@ -28,7 +28,6 @@ bool CopyBackgroundBitmap(HDC dc) {
     MemoryDc memory(CreateCompatibleDC(screen.Get()));
     if (!memory) return false;
     SelectionGuard bitmap(memory.Get(), launcher.backgroundBitmap.Get());
-    PaletteGuard palette(memory.Get(), launcher.palette.Get());
     return BitBlt(dc, 0, 0, launcher.backgroundWidth, launcher.backgroundHeight, memory.Get(), 0, 0,
                   SRCCOPY) != FALSE;
 }
